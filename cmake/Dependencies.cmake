@@ -1,0 +1,31 @@
+# GoogleTest: Debian's build natively, built from Debian's sources for MinGW.
+if(WIN32)
+  set(gtest_force_shared_crt OFF CACHE BOOL "" FORCE)
+  set(INSTALL_GTEST OFF CACHE BOOL "" FORCE)
+  set(BUILD_GMOCK OFF CACHE BOOL "" FORCE)
+  add_subdirectory(/usr/src/googletest ${CMAKE_BINARY_DIR}/googletest EXCLUDE_FROM_ALL)
+  add_library(vek_gtest_main INTERFACE)
+  target_link_libraries(vek_gtest_main INTERFACE gtest_main)
+else()
+  find_package(GTest REQUIRED)
+  add_library(vek_gtest_main INTERFACE)
+  target_link_libraries(vek_gtest_main INTERFACE GTest::gtest_main)
+endif()
+
+# libvorbisfile: Debian's natively, our static MinGW build from .deps otherwise.
+if(WIN32)
+  set(VEK_MINGW_DEPS ${PROJECT_SOURCE_DIR}/.deps/mingw)
+  if(NOT EXISTS ${VEK_MINGW_DEPS}/lib/libvorbisfile.a)
+    message(FATAL_ERROR "libvorbis for MinGW is missing: run tools/setup-deps")
+  endif()
+  add_library(vek_vorbis INTERFACE)
+  target_include_directories(vek_vorbis INTERFACE ${VEK_MINGW_DEPS}/include)
+  target_link_libraries(vek_vorbis INTERFACE
+    ${VEK_MINGW_DEPS}/lib/libvorbisfile.a ${VEK_MINGW_DEPS}/lib/libvorbisenc.a
+    ${VEK_MINGW_DEPS}/lib/libvorbis.a ${VEK_MINGW_DEPS}/lib/libogg.a)
+else()
+  find_package(PkgConfig REQUIRED)
+  pkg_check_modules(VORBIS REQUIRED IMPORTED_TARGET vorbisfile vorbisenc vorbis ogg)
+  add_library(vek_vorbis INTERFACE)
+  target_link_libraries(vek_vorbis INTERFACE PkgConfig::VORBIS)
+endif()

@@ -1,0 +1,21 @@
+#include "tests/support/environment.h"
+
+#include <cstdlib>
+#include <windows.h>
+
+namespace testing_support
+{
+
+void SetEnvironment(const char* name, const char* value)
+{
+    ::_putenv_s(name, value);
+    ::SetEnvironmentVariableA(name, value);
+}
+
+void ClearEnvironment(const char* name)
+{
+    ::_putenv_s(name, "");
+    ::SetEnvironmentVariableA(name, nullptr);
+}
+
+} // namespace testing_support

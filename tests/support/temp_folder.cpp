@@ -1,0 +1,73 @@
+#include "tests/support/temp_folder.h"
+
+#include <atomic>
+#include <random>
+#include <cstdlib>
+#include <fstream>
+#include <iterator>
+
+namespace testing_support
+{
+namespace
+{
+std::filesystem::path NewFolderPath()
+{
+    static std::atomic<int> counter{0};
+    // <chrono> cannot be used here: its literals have no code page 932 form.
+    static const unsigned stamp = std::random_device{}();
+    return std::filesystem::temp_directory_path() /
+           ("vek-test-" + std::to_string(stamp) + "-" + std::to_string(counter++));
+}
+} // namespace
+
+ScopedEnvironment::ScopedEnvironment(const char* name, const char* value) : name_(name)
+{
+    if (const char* old = std::getenv(name))
+        previous_ = old;
+    if (value != nullptr)
+        SetEnvironment(name, value);
+    else
+        ClearEnvironment(name);
+}
+
+ScopedEnvironment::~ScopedEnvironment()
+{
+    if (previous_)
+        SetEnvironment(name_.c_str(), previous_->c_str());
+    else
+        ClearEnvironment(name_.c_str());
+}
+
+TempFolder::TempFolder() : path_(NewFolderPath()) { std::filesystem::create_directories(path_); }
+
+TempFolder::~TempFolder()
+{
+    std::error_code ignored;
+    std::filesystem::remove_all(path_, ignored);
+}
+
+TempSaveFolder::TempSaveFolder() : temp_("TEMP", (root_.Path() / "Temp").string().c_str()) {}
+
+std::filesystem::path TempSaveFolder::SaveDirectory() const
+{
+    return root_.Path() / "Tolvenik" / "VEK";
+}
+
+std::string TempSaveFolder::SettingsFile() const
+{
+    return (SaveDirectory() / "GameConfig.dat").string();
+}
+
+std::vector<std::uint8_t> ReadBytes(const std::string& path)
+{
+    std::ifstream in(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+}
+
+void WriteBytes(const std::string& path, const std::vector<std::uint8_t>& bytes)
+{
+    std::ofstream out(path, std::ios::binary | std::ios::trunc);
+    out.write(reinterpret_cast<const char*>(bytes.data()), std::streamsize(bytes.size()));
+}
+
+} // namespace testing_support

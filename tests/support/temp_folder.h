@@ -1,0 +1,49 @@
+#pragma once
+
+#include "tests/support/environment.h"
+
+#include <cstdint>
+#include <filesystem>
+#include <string>
+#include <vector>
+
+namespace testing_support
+{
+
+// A fresh folder of the test's own, removed with everything in it at the end.
+class TempFolder
+{
+public:
+    TempFolder();
+    ~TempFolder();
+    TempFolder(const TempFolder&) = delete;
+    TempFolder& operator=(const TempFolder&) = delete;
+
+    const std::filesystem::path& Path() const { return path_; }
+    std::string File(const std::string& name) const { return (path_ / name).string(); }
+
+private:
+    std::filesystem::path path_;
+};
+
+// A folder whose "Temp" subfolder is the process's TEMP for the scope, so
+// the tool's own settings file lands inside it.
+class TempSaveFolder
+{
+public:
+    TempSaveFolder();
+
+    // Where the tool keeps "GameConfig.dat" for this TEMP.
+    std::string SettingsFile() const;
+    std::filesystem::path SaveDirectory() const;
+    const TempFolder& Root() const { return root_; }
+
+private:
+    TempFolder root_;
+    ScopedEnvironment temp_;
+};
+
+std::vector<std::uint8_t> ReadBytes(const std::string& path);
+void WriteBytes(const std::string& path, const std::vector<std::uint8_t>& bytes);
+
+} // namespace testing_support
