@@ -17,7 +17,7 @@ bool WriteFileAtomically(const char* path, const void* data, std::size_t size)
     bool written = std::fwrite(data, 1, size, file) == size;
     written = FlushToDisk(file) && written;
     written = std::fclose(file) == 0 && written;
-    if (written && ReplaceFile(temporary.c_str(), path))
+    if (written && ReplaceExistingFile(temporary.c_str(), path))
         return true;
     std::remove(temporary.c_str());
     return false;

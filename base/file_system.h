@@ -17,6 +17,6 @@ void CreateDirectoryIgnoringFailure(const char* path);
 bool FlushToDisk(std::FILE* file);
 
 // Puts `source` in the place of `target` in one step, replacing it.
-bool ReplaceFile(const char* source, const char* target);
+bool ReplaceExistingFile(const char* source, const char* target);
 
 } // namespace base

@@ -1,7 +1,7 @@
 #include "base/file_system.h"
 
 #include <io.h>
-#include <windows.h>
+#include "base/win32.h"
 
 namespace base
 {
@@ -12,7 +12,7 @@ void CreateDirectoryIgnoringFailure(const char* path) { ::CreateDirectoryA(path,
 
 bool FlushToDisk(std::FILE* file) { return std::fflush(file) == 0 && ::_commit(::_fileno(file)) == 0; }
 
-bool ReplaceFile(const char* source, const char* target)
+bool ReplaceExistingFile(const char* source, const char* target)
 {
     return ::MoveFileExA(source, target, MOVEFILE_REPLACE_EXISTING | MOVEFILE_WRITE_THROUGH) != 0;
 }

@@ -1,6 +1,9 @@
 # Settings shared by every target of the project (not by third-party code).
 function(vek_target_defaults target)
-  target_compile_options(${target} PRIVATE -Wall -Wextra)
+  # Every narrow literal is a code page 932 string: the game reads the same
+  # bytes. (Not for GoogleTest's own sources: its <chrono> has literals that
+  # code page has no form for.)
+  target_compile_options(${target} PRIVATE -finput-charset=UTF-8 -fexec-charset=CP932 -Wall -Wextra)
   if(VEK_WARNINGS_AS_ERRORS)
     target_compile_options(${target} PRIVATE -Werror)
   endif()

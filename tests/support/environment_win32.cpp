@@ -1,7 +1,7 @@
 #include "tests/support/environment.h"
 
 #include <cstdlib>
-#include <windows.h>
+#include "base/win32.h"
 
 namespace testing_support
 {

@@ -1,0 +1,41 @@
+#include "app/application_main.h"
+
+#include "app/system.h"
+
+CApplicationMain::CApplicationMain()
+    : system_(nullptr), graphicsDevice_(nullptr), comObject_(nullptr), textInput_(nullptr),
+      timerRaised_(false)
+{
+}
+
+CApplicationMain::~CApplicationMain() { ReleaseBase(); }
+
+bool CApplicationMain::Update() { return true; }
+
+bool CApplicationMain::OnUserMessage1() { return true; }
+
+bool CApplicationMain::OnUserMessage2() { return true; }
+
+bool CApplicationMain::Render() { return true; }
+
+bool CApplicationMain::Exit()
+{
+    ReleaseBase();
+    return true;
+}
+
+const char* CApplicationMain::GetClassName() const { return "CApplicationMain"; }
+
+void CApplicationMain::ReleaseBase()
+{
+    if (system_ != nullptr)
+    {
+        delete system_;
+        system_ = nullptr;
+    }
+    if (timerRaised_)
+    {
+        EndFrameTimer();
+        timerRaised_ = false;
+    }
+}

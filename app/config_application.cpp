@@ -1,0 +1,95 @@
+#include "app/config_application.h"
+
+#include "app/system.h"
+#include "resources/resource.h"
+
+#include <commctrl.h>
+
+#include <new>
+
+namespace
+{
+CConfigApplication* application = nullptr;
+}
+
+CConfigApplication* Application() { return application; }
+
+void SetApplication(CConfigApplication* instance) { application = instance; }
+
+LRESULT CALLBACK AppWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam)
+{
+    if (message == WM_DESTROY)
+    {
+        PostQuitMessage(0);
+        return 0;
+    }
+    if (application != nullptr)
+        return application->WindowProc(window, message, wParam, lParam);
+    return DefWindowProcA(window, message, wParam, lParam);
+}
+
+CConfigApplication::CConfigApplication()
+    : record_(nullptr), mainTab_(nullptr), keyTab_(nullptr), currentPage_(nullptr),
+      currentKeyPage_(nullptr), procedure_(nullptr), focusedAction_(0), selectedPlayer_(0),
+      ipEntry_(), pages_(), keyPages_(), musicEdits_(), tensionEdits_()
+{
+}
+
+CConfigApplication::~CConfigApplication() { Exit(); }
+
+bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
+{
+    record_ = new (std::nothrow) config::CSaveConfig();
+    if (record_ == nullptr)
+        return false;
+    if (!record_->Load())
+    {
+        MessageBoxA(nullptr, "コンフィグファイルが読み込めません", "", MB_OK);
+        return false;
+    }
+
+    INITCOMMONCONTROLSEX controls = {sizeof controls, ICC_LISTVIEW_CLASSES | ICC_TAB_CLASSES};
+    if (!InitCommonControlsEx(&controls))
+        return false;
+
+    system_ = new (std::nothrow) CSystem();
+    if (system_ == nullptr)
+        return false;
+    if (!system_->CreateDialogWindow(instance, MAKEINTRESOURCEA(IDD_MAIN), -1, -1, IDI_APP,
+                                     reinterpret_cast<DLGPROC>(procedure), nullptr))
+        return false;
+    procedure_ = procedure;
+
+    BeginFrameTimer(system_, 60);
+    timerRaised_ = true;
+    return true;
+}
+
+bool CConfigApplication::Update() { return true; }
+
+bool CConfigApplication::Render() { return true; }
+
+bool CConfigApplication::Exit()
+{
+    if (record_ != nullptr)
+    {
+        delete record_;
+        record_ = nullptr;
+    }
+    for (int row = 0; row < config::kUserBgmRowCount; ++row)
+    {
+        for (SubclassedEdit* edit : {&musicEdits_[row], &tensionEdits_[row]})
+        {
+            if (edit->previousProcedure != nullptr)
+                SetWindowLongPtrA(edit->window, GWLP_WNDPROC,
+                                  reinterpret_cast<LONG_PTR>(edit->previousProcedure));
+        }
+    }
+    ReleaseBase();
+    return true;
+}
+
+LRESULT CConfigApplication::WindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam)
+{
+    return OnMainDialog(window, message, wParam, lParam);
+}

@@ -1,0 +1,70 @@
+#pragma once
+
+#include "app/application_main.h"
+#include "config/save_config.h"
+
+#include <cstdint>
+
+// A dialog of the tool: its template and, once created, its window.
+struct PageSlot
+{
+    std::uint32_t templateId;
+    HWND window;
+};
+
+// An edit whose window procedure the tool replaces to take dropped files.
+struct SubclassedEdit
+{
+    std::uint32_t controlId;
+    HWND window;
+    WNDPROC previousProcedure;
+};
+
+inline constexpr int kPageCount = 7;
+inline constexpr int kKeyPageCount = 2;
+inline constexpr int kKeyConfigPageIndex = 5;
+
+class CConfigApplication : public CApplicationMain
+{
+public:
+    CConfigApplication();
+    ~CConfigApplication() override;
+
+    bool Init(HINSTANCE instance, WNDPROC procedure) override;
+    bool Update() override;
+    bool Render() override;
+    bool Exit() override;
+    LRESULT WindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) override;
+
+    config::CSaveConfig* Record() { return record_; }
+    CSystem* System() { return system_; }
+
+private:
+    // The main dialog's own messages: the two buttons, the close command and
+    // the tab.
+    LRESULT OnMainDialog(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam);
+    LRESULT OnSave(HWND dialog);
+    void ConfirmClose(HWND dialog, const char* question);
+
+    config::CSaveConfig* record_;
+    HWND mainTab_;
+    HWND keyTab_;
+    HWND currentPage_;
+    HWND currentKeyPage_;
+    WNDPROC procedure_;
+    std::int8_t focusedAction_;
+    std::uint32_t selectedPlayer_;
+    config::IpEntry ipEntry_;
+    PageSlot pages_[kPageCount];
+    PageSlot keyPages_[kKeyPageCount];
+    SubclassedEdit musicEdits_[config::kUserBgmRowCount];
+    SubclassedEdit tensionEdits_[config::kUserBgmRowCount];
+};
+
+// The one application object of the process. Set as soon as it is
+// constructed: messages sent while the dialogs are created must reach it.
+CConfigApplication* Application();
+void SetApplication(CConfigApplication* application);
+
+// The window procedure of every dialog, page and subclassed edit of the tool.
+LRESULT CALLBACK AppWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam);

@@ -1,0 +1,110 @@
+#include "app/system.h"
+
+#include <commdlg.h>
+#include <mmsystem.h>
+
+#include <cstdlib>
+#include <cstring>
+
+CSystem::CSystem()
+    : instance_(nullptr), window_(nullptr), name_(nullptr), directory_(), width_(0), height_(0),
+      style_(0)
+{
+}
+
+CSystem::~CSystem()
+{
+    std::free(name_);
+    name_ = nullptr;
+}
+
+const char* CSystem::GetClassName() const { return "CSystem"; }
+
+bool CSystem::CreateDialogWindow(HINSTANCE instance, LPCSTR dialogTemplate, int x, int y, UINT,
+                                 DLGPROC procedure, HWND parent)
+{
+    if (instance == nullptr)
+        return false;
+    instance_ = instance;
+    window_ = CreateDialogParamA(instance, dialogTemplate, parent, procedure, 0);
+    if (window_ == nullptr)
+        return false;
+    RECT rect;
+    GetWindowRect(window_, &rect);
+    SetName("Dialog");
+    const int width = std::abs(rect.right - rect.left);
+    const int height = std::abs(rect.bottom - rect.top);
+    width_ = width;
+    height_ = height;
+    if (x < 0)
+        x = (GetSystemMetrics(SM_CXSCREEN) - width) / 2;
+    if (y < 0)
+        y = (GetSystemMetrics(SM_CYSCREEN) - height) / 2;
+    MoveWindow(window_, x, y, width, height, TRUE);
+    ShowWindow(window_, SW_SHOWNORMAL);
+    UpdateWindow(window_);
+    SetCurrentDir(nullptr);
+    return true;
+}
+
+void CSystem::SetName(const char* name)
+{
+    std::free(name_);
+    name_ = nullptr;
+    if (name == nullptr)
+        return;
+    const std::size_t size = std::strlen(name) + 1;
+    name_ = static_cast<char*>(std::malloc(size));
+    if (name_ == nullptr)
+        return;
+    std::memcpy(name_, name, size);
+    SetWindowTextA(window_, name_);
+}
+
+bool CSystem::GetModuleDir(char* buffer, std::uint32_t size) const
+{
+    if (size == 0)
+        return false;
+    const DWORD length = GetModuleFileNameA(instance_, buffer, size);
+    // A name cut by the buffer is not terminated on every Windows version.
+    buffer[length < size ? length : size - 1] = '\0';
+    for (std::size_t end = std::strlen(buffer); end > 0 && buffer[end - 1] != '\\'; --end)
+        buffer[end - 1] = '\0';
+    return true;
+}
+
+bool CSystem::SetCurrentDir(const char* path)
+{
+    if (path != nullptr)
+    {
+        std::strncpy(directory_, path, sizeof directory_ - 1);
+        directory_[sizeof directory_ - 1] = '\0';
+    }
+    else
+    {
+        GetModuleDir(directory_, sizeof directory_);
+    }
+    return SetCurrentDirectoryA(directory_) != 0;
+}
+
+bool CSystem::OpenFileDialog(char* file, const char* title, const char* filter,
+                             const char* defaultExtension)
+{
+    OPENFILENAMEA dialog = {};
+    dialog.lStructSize = sizeof dialog;
+    dialog.hwndOwner = window_;
+    dialog.lpstrFilter = filter;
+    dialog.lpstrFile = file;
+    dialog.nMaxFile = MAX_PATH;
+    dialog.lpstrTitle = title;
+    dialog.Flags = OFN_FILEMUSTEXIST;
+    dialog.lpstrDefExt = defaultExtension;
+    const BOOL chosen = GetOpenFileNameA(&dialog);
+    // Browsing may have moved the current directory away from the program's.
+    SetCurrentDirectoryA(directory_);
+    return chosen != 0;
+}
+
+void BeginFrameTimer(CSystem*, std::uint32_t) { timeBeginPeriod(1); }
+
+void EndFrameTimer() { timeEndPeriod(1); }

@@ -1,0 +1,49 @@
+#pragma once
+
+#include "base/win32.h"
+
+#include <cstdint>
+
+// The window object: owns the tool's one top-level window (the main dialog),
+// remembers the program's directory and opens the file-open dialog.
+class CSystem final
+{
+public:
+    CSystem();
+    ~CSystem();
+    CSystem(const CSystem&) = delete;
+    CSystem& operator=(const CSystem&) = delete;
+
+    virtual const char* GetClassName() const;
+
+    // Creates the modeless dialog from `dialogTemplate`; x or y below 0
+    // centres it on the screen along that axis. The icon is accepted and not
+    // applied.
+    bool CreateDialogWindow(HINSTANCE instance, LPCSTR dialogTemplate, int x, int y, UINT icon,
+                            DLGPROC procedure, HWND parent);
+    void SetName(const char* name);
+    HWND GetHwnd() const { return window_; }
+    HINSTANCE GetInstance() const { return instance_; }
+    bool GetModuleDir(char* buffer, std::uint32_t size) const;
+    bool SetCurrentDir(const char* path);
+
+    // `file` is the caller's 260-byte buffer: the initial name on entry, the
+    // chosen path on success. False for cancel and errors alike; either way
+    // the program's directory is the current directory again afterwards.
+    bool OpenFileDialog(char* file, const char* title, const char* filter,
+                        const char* defaultExtension);
+
+private:
+    HINSTANCE instance_;
+    HWND window_;
+    char* name_;
+    char directory_[MAX_PATH];
+    std::uint32_t width_;
+    std::uint32_t height_;
+    std::uint32_t style_;
+};
+
+// The system timer runs at one millisecond for the application's lifetime;
+// every raise is matched by exactly one restore.
+void BeginFrameTimer(CSystem* window, std::uint32_t framesPerSecond);
+void EndFrameTimer();
