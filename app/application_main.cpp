@@ -8,15 +8,30 @@ CApplicationMain::CApplicationMain()
 {
 }
 
-CApplicationMain::~CApplicationMain() { ReleaseBase(); }
+CApplicationMain::~CApplicationMain()
+{
+    ReleaseBase();
+}
 
-bool CApplicationMain::Update() { return true; }
+bool CApplicationMain::Update()
+{
+    return true;
+}
 
-bool CApplicationMain::OnUserMessage1() { return true; }
+bool CApplicationMain::OnUserMessage1()
+{
+    return true;
+}
 
-bool CApplicationMain::OnUserMessage2() { return true; }
+bool CApplicationMain::OnUserMessage2()
+{
+    return true;
+}
 
-bool CApplicationMain::Render() { return true; }
+bool CApplicationMain::Render()
+{
+    return true;
+}
 
 bool CApplicationMain::Exit()
 {
@@ -24,7 +39,10 @@ bool CApplicationMain::Exit()
     return true;
 }
 
-const char* CApplicationMain::GetClassName() const { return "CApplicationMain"; }
+const char* CApplicationMain::GetClassName() const
+{
+    return "CApplicationMain";
+}
 
 void CApplicationMain::ReleaseBase()
 {

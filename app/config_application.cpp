@@ -4,7 +4,6 @@
 #include "resources/resource.h"
 
 #include <commctrl.h>
-
 #include <new>
 
 namespace
@@ -12,9 +11,15 @@ namespace
 CConfigApplication* application = nullptr;
 }
 
-CConfigApplication* Application() { return application; }
+CConfigApplication* Application()
+{
+    return application;
+}
 
-void SetApplication(CConfigApplication* instance) { application = instance; }
+void SetApplication(CConfigApplication* instance)
+{
+    application = instance;
+}
 
 LRESULT CALLBACK AppWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam)
 {
@@ -35,7 +40,10 @@ CConfigApplication::CConfigApplication()
 {
 }
 
-CConfigApplication::~CConfigApplication() { Exit(); }
+CConfigApplication::~CConfigApplication()
+{
+    Exit();
+}
 
 bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
 {
@@ -65,9 +73,15 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
     return true;
 }
 
-bool CConfigApplication::Update() { return true; }
+bool CConfigApplication::Update()
+{
+    return true;
+}
 
-bool CConfigApplication::Render() { return true; }
+bool CConfigApplication::Render()
+{
+    return true;
+}
 
 bool CConfigApplication::Exit()
 {

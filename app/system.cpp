@@ -1,10 +1,9 @@
 #include "app/system.h"
 
 #include <commdlg.h>
-#include <mmsystem.h>
-
 #include <cstdlib>
 #include <cstring>
+#include <mmsystem.h>
 
 CSystem::CSystem()
     : instance_(nullptr), window_(nullptr), name_(nullptr), directory_(), width_(0), height_(0),
@@ -18,7 +17,10 @@ CSystem::~CSystem()
     name_ = nullptr;
 }
 
-const char* CSystem::GetClassName() const { return "CSystem"; }
+const char* CSystem::GetClassName() const
+{
+    return "CSystem";
+}
 
 bool CSystem::CreateDialogWindow(HINSTANCE instance, LPCSTR dialogTemplate, int x, int y, UINT,
                                  DLGPROC procedure, HWND parent)
@@ -105,6 +107,12 @@ bool CSystem::OpenFileDialog(char* file, const char* title, const char* filter,
     return chosen != 0;
 }
 
-void BeginFrameTimer(CSystem*, std::uint32_t) { timeBeginPeriod(1); }
+void BeginFrameTimer(CSystem*, std::uint32_t)
+{
+    timeBeginPeriod(1);
+}
 
-void EndFrameTimer() { timeEndPeriod(1); }
+void EndFrameTimer()
+{
+    timeEndPeriod(1);
+}

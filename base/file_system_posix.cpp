@@ -7,12 +7,24 @@
 namespace base
 {
 
-char PathSeparator() { return '/'; }
+char PathSeparator()
+{
+    return '/';
+}
 
-void CreateDirectoryIgnoringFailure(const char* path) { ::mkdir(path, 0777); }
+void CreateDirectoryIgnoringFailure(const char* path)
+{
+    ::mkdir(path, 0777);
+}
 
-bool FlushToDisk(std::FILE* file) { return std::fflush(file) == 0 && ::fsync(::fileno(file)) == 0; }
+bool FlushToDisk(std::FILE* file)
+{
+    return std::fflush(file) == 0 && ::fsync(::fileno(file)) == 0;
+}
 
-bool ReplaceExistingFile(const char* source, const char* target) { return std::rename(source, target) == 0; }
+bool ReplaceExistingFile(const char* source, const char* target)
+{
+    return std::rename(source, target) == 0;
+}
 
 } // namespace base

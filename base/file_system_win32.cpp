@@ -1,16 +1,25 @@
 #include "base/file_system.h"
+#include "base/win32.h"
 
 #include <io.h>
-#include "base/win32.h"
 
 namespace base
 {
 
-char PathSeparator() { return '\\'; }
+char PathSeparator()
+{
+    return '\\';
+}
 
-void CreateDirectoryIgnoringFailure(const char* path) { ::CreateDirectoryA(path, nullptr); }
+void CreateDirectoryIgnoringFailure(const char* path)
+{
+    ::CreateDirectoryA(path, nullptr);
+}
 
-bool FlushToDisk(std::FILE* file) { return std::fflush(file) == 0 && ::_commit(::_fileno(file)) == 0; }
+bool FlushToDisk(std::FILE* file)
+{
+    return std::fflush(file) == 0 && ::_commit(::_fileno(file)) == 0;
+}
 
 bool ReplaceExistingFile(const char* source, const char* target)
 {

@@ -16,8 +16,8 @@ void* AllocateZeroed(std::size_t size) noexcept
         return nullptr;
     if (allocationsBeforeFailure > 0)
         --allocationsBeforeFailure;
-    void* block = ::operator new(size == 0 ? 1 : size, std::align_val_t(kBlockAlignment),
-                                 std::nothrow);
+    void* block =
+        ::operator new(size == 0 ? 1 : size, std::align_val_t(kBlockAlignment), std::nothrow);
     if (block != nullptr)
         std::memset(block, 0, size);
     return block;
@@ -34,7 +34,10 @@ ScopedAllocationFailure::ScopedAllocationFailure(int successes)
     allocationsBeforeFailure = successes;
 }
 
-ScopedAllocationFailure::~ScopedAllocationFailure() { allocationsBeforeFailure = -1; }
+ScopedAllocationFailure::~ScopedAllocationFailure()
+{
+    allocationsBeforeFailure = -1;
+}
 
 void* CAllocated::operator new(std::size_t size)
 {
@@ -49,6 +52,9 @@ void* CAllocated::operator new(std::size_t size, const std::nothrow_t&) noexcept
     return AllocateZeroed(size);
 }
 
-void CAllocated::operator delete(void* block) noexcept { FreeBlock(block); }
+void CAllocated::operator delete(void* block) noexcept
+{
+    FreeBlock(block);
+}
 
 } // namespace base

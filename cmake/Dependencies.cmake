@@ -1,5 +1,6 @@
-# GoogleTest: Debian's build natively, built from Debian's sources for MinGW.
-if(WIN32)
+# GoogleTest: Debian's build natively; for the MinGW cross build, built here
+# from Debian's sources; on Windows itself, the toolchain's own package.
+if(WIN32 AND EXISTS /usr/src/googletest/CMakeLists.txt)
   set(gtest_force_shared_crt OFF CACHE BOOL "" FORCE)
   set(INSTALL_GTEST OFF CACHE BOOL "" FORCE)
   set(BUILD_GMOCK OFF CACHE BOOL "" FORCE)
@@ -12,11 +13,12 @@ else()
   target_link_libraries(vek_gtest_main INTERFACE GTest::gtest_main)
 endif()
 
-# libvorbisfile: Debian's natively, our static MinGW build from .deps otherwise.
+# libvorbisfile: Debian's natively; for Windows the static libraries under
+# VEK_MINGW_DEPS (tools/setup-deps builds them into .deps/mingw).
 if(WIN32)
-  set(VEK_MINGW_DEPS ${PROJECT_SOURCE_DIR}/.deps/mingw)
+  set(VEK_MINGW_DEPS ${PROJECT_SOURCE_DIR}/.deps/mingw CACHE PATH "Prefix of the MinGW libogg and libvorbis")
   if(NOT EXISTS ${VEK_MINGW_DEPS}/lib/libvorbisfile.a)
-    message(FATAL_ERROR "libvorbis for MinGW is missing: run tools/setup-deps")
+    message(FATAL_ERROR "libvorbis for MinGW is missing under ${VEK_MINGW_DEPS}: run tools/setup-deps")
   endif()
   add_library(vek_vorbis INTERFACE)
   target_include_directories(vek_vorbis INTERFACE ${VEK_MINGW_DEPS}/include)

@@ -24,7 +24,8 @@ constexpr std::size_t kEntrySize = sizeof(IpEntry);
 // A new exact-size copy of a list; null when the block cannot be had.
 IpEntry* AllocateList(std::uint64_t count)
 {
-    return static_cast<IpEntry*>(base::AllocateZeroed(static_cast<std::size_t>(count * kEntrySize)));
+    return static_cast<IpEntry*>(
+        base::AllocateZeroed(static_cast<std::size_t>(count * kEntrySize)));
 }
 
 bool AppendEntry(IpEntry*& list, std::uint32_t& count, const IpEntry& entry)
@@ -133,7 +134,8 @@ bool ReadList(ImageReader& reader, IpEntry*& list, std::uint32_t count)
     return true;
 }
 
-template <typename Section> void AppendSection(std::vector<std::uint8_t>& image, const Section& section)
+template <typename Section>
+void AppendSection(std::vector<std::uint8_t>& image, const Section& section)
 {
     const std::uint32_t length = sizeof section;
     const auto* lengthBytes = reinterpret_cast<const std::uint8_t*>(&length);
@@ -207,9 +209,9 @@ CSaveConfig::CSaveConfig()
 }
 
 CSaveConfig::CSaveConfig(const CSaveConfig& other)
-    : graphics_(other.graphics_), game_(other.game_), network_(other.network_),
-      allowList_(nullptr), denyList_(nullptr), replay_(other.replay_), userBgm_(other.userBgm_),
-      keys_(other.keys_), radioChat_(other.radioChat_)
+    : graphics_(other.graphics_), game_(other.game_), network_(other.network_), allowList_(nullptr),
+      denyList_(nullptr), replay_(other.replay_), userBgm_(other.userBgm_), keys_(other.keys_),
+      radioChat_(other.radioChat_)
 {
     // A list that cannot be copied leaves the clone with an empty list, so
     // its count always matches its array; Clone reports it.
@@ -231,7 +233,10 @@ CSaveConfig::CSaveConfig(const CSaveConfig& other)
     }
 }
 
-CSaveConfig::~CSaveConfig() { Release(); }
+CSaveConfig::~CSaveConfig()
+{
+    Release();
+}
 
 bool CSaveConfig::Release()
 {
@@ -242,15 +247,30 @@ bool CSaveConfig::Release()
     return true;
 }
 
-const char* CSaveConfig::GetClassName() const { return "CSaveConfig"; }
+const char* CSaveConfig::GetClassName() const
+{
+    return "CSaveConfig";
+}
 
-std::uint32_t CSaveConfig::GetClassSize() const { return sizeof(CSaveConfig); }
+std::uint32_t CSaveConfig::GetClassSize() const
+{
+    return sizeof(CSaveConfig);
+}
 
-CSaveConfig* CSaveConfig::CreateAt(void* memory) const { return new (memory) CSaveConfig(); }
+CSaveConfig* CSaveConfig::CreateAt(void* memory) const
+{
+    return new (memory) CSaveConfig();
+}
 
-CSaveConfig* CSaveConfig::Create() const { return new (std::nothrow) CSaveConfig(); }
+CSaveConfig* CSaveConfig::Create() const
+{
+    return new (std::nothrow) CSaveConfig();
+}
 
-CSaveConfig* CSaveConfig::CloneAt(void* memory) const { return new (memory) CSaveConfig(*this); }
+CSaveConfig* CSaveConfig::CloneAt(void* memory) const
+{
+    return new (memory) CSaveConfig(*this);
+}
 
 CSaveConfig* CSaveConfig::Clone() const
 {

@@ -22,7 +22,8 @@ LRESULT CConfigApplication::OnMainDialog(HWND dialog, UINT message, WPARAM wPara
         case IDOK:
             return OnSave(dialog);
         case IDCANCEL:
-            ConfirmClose(dialog, "保存されていないデータは失われます\nコンフィグツールを閉じますか？");
+            ConfirmClose(dialog,
+                         "保存されていないデータは失われます\nコンフィグツールを閉じますか？");
             return TRUE;
         default:
             return TRUE;

@@ -3,10 +3,9 @@
 #include "base/atomic_file.h"
 #include "tests/support/temp_folder.h"
 
-#include <gtest/gtest.h>
-
 #include <csignal>
 #include <filesystem>
+#include <gtest/gtest.h>
 #include <sys/resource.h>
 
 using testing_support::ReadBytes;

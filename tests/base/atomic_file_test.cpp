@@ -1,9 +1,8 @@
 #include "base/atomic_file.h"
 #include "tests/support/temp_folder.h"
 
-#include <gtest/gtest.h>
-
 #include <filesystem>
+#include <gtest/gtest.h>
 
 using testing_support::ReadBytes;
 using testing_support::TempFolder;

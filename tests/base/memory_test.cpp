@@ -1,8 +1,7 @@
 #include "base/memory.h"
 
-#include <gtest/gtest.h>
-
 #include <cstdint>
+#include <gtest/gtest.h>
 
 TEST(Memory, BlocksAreAlignedAndZeroed)
 {

@@ -2,9 +2,8 @@
 #include "base/memory.h"
 #include "config/save_config.h"
 
-#include <gtest/gtest.h>
-
 #include <cstring>
+#include <gtest/gtest.h>
 
 using config::CSaveConfig;
 using config::IpEntry;
@@ -45,7 +44,10 @@ struct Image
         bytes.insert(bytes.end(), count, value);
         return *this;
     }
-    Image& Section(std::uint32_t length, std::uint8_t value) { return U32(length).Fill(length, value); }
+    Image& Section(std::uint32_t length, std::uint8_t value)
+    {
+        return U32(length).Fill(length, value);
+    }
 };
 
 CSaveConfig Defaults()
@@ -77,15 +79,15 @@ TEST(SaveConfigImage, DefaultsMakeA6876ByteImageWithEveryLengthWordInPlace)
         {4, 20}, {28, 40}, {72, 472}, {548, 124}, {676, 5200}, {5880, 496}, {6380, 492}};
     for (auto [offset, length] : lengths)
         EXPECT_EQ(U32At(image, offset), length) << "at " << offset;
-    EXPECT_EQ(image[8], 2);                         // screenSize
-    EXPECT_EQ(U32At(image, 8 + 8), 1u);             // showMovie
-    EXPECT_EQ(U32At(image, 8 + 16), 1u);            // trailQuality
-    EXPECT_EQ(image[76] | image[77] << 8, 18000);   // port
-    EXPECT_EQ(image[76 + 8], 1);                    // keyResponse
-    EXPECT_EQ(U32At(image, 76 + 468), 1u);          // playBgm
-    EXPECT_EQ(U32At(image, 552), 1u);               // saveReplays
-    EXPECT_EQ(U32At(image, 5884), 0x50u);           // first keyboard key
-    EXPECT_EQ(U32At(image, 5884 + 23 * 4), 0x39u);  // last keyboard key
+    EXPECT_EQ(image[8], 2);                        // screenSize
+    EXPECT_EQ(U32At(image, 8 + 8), 1u);            // showMovie
+    EXPECT_EQ(U32At(image, 8 + 16), 1u);           // trailQuality
+    EXPECT_EQ(image[76] | image[77] << 8, 18000);  // port
+    EXPECT_EQ(image[76 + 8], 1);                   // keyResponse
+    EXPECT_EQ(U32At(image, 76 + 468), 1u);         // playBgm
+    EXPECT_EQ(U32At(image, 552), 1u);              // saveReplays
+    EXPECT_EQ(U32At(image, 5884), 0x50u);          // first keyboard key
+    EXPECT_EQ(U32At(image, 5884 + 23 * 4), 0x39u); // last keyboard key
     for (int player = 0; player < 4; ++player)
     {
         EXPECT_EQ(U32At(image, 5884 + 96 + 100 * player + 4 * 7), 7u);
@@ -100,7 +102,13 @@ TEST(SaveConfigImage, SavingTwoAllowEntriesPutsReplayLengthAt580)
     ASSERT_TRUE(record.AddAllowEntry(Entry("*", "*", "*", "*")));
     const std::vector<std::uint8_t> image = record.SaveToBytes();
     ASSERT_EQ(image.size(), 6908u);
-    EXPECT_EQ(std::memcmp(image.data() + 548, "192\0" "168\0" "000\0" "001\0", 16), 0);
+    EXPECT_EQ(std::memcmp(image.data() + 548,
+                          "192\0"
+                          "168\0"
+                          "000\0"
+                          "001\0",
+                          16),
+              0);
     EXPECT_EQ(std::memcmp(image.data() + 564, "*\0\0\0*\0\0\0*\0\0\0*\0\0\0", 16), 0);
     EXPECT_EQ(U32At(image, 580), 124u);
 }
@@ -131,7 +139,10 @@ TEST(SaveConfigImage, VersionRules)
     {
         std::uint32_t version;
         bool loads;
-    } cases[] = {{0x13001000, true}, {0x12000000, true}, {0x10001000, true}, {0x13001001, false},
+    } cases[] = {{0x13001000, true},
+                 {0x12000000, true},
+                 {0x10001000, true},
+                 {0x13001001, false},
                  {0xFFFFFFFF, false}};
     for (const Case& c : cases)
     {
@@ -200,7 +211,8 @@ TEST(SaveConfigImage, LongerSectionsAreCutToOursAndTheRestIsPassedOver)
     CSaveConfig record;
     ASSERT_TRUE(Load(record, image.bytes));
     EXPECT_EQ(record.Graphics()->trailQuality, 0x01010101u);
-    EXPECT_EQ(record.Game()->screenShake, 0x02020202u) << "the next section starts after the excess";
+    EXPECT_EQ(record.Game()->screenShake, 0x02020202u)
+        << "the next section starts after the excess";
     EXPECT_EQ(record.Network()->port, 18000) << "an absent section keeps its defaults";
 }
 
@@ -334,9 +346,9 @@ TEST(SaveConfigLists, ConnectSlotEmptinessFollowsAtoi)
         IpEntry entry;
         bool empty;
     } cases[] = {
-        {Entry("", "", "", ""), true},         {Entry("000", "000", "000", "000"), true},
-        {Entry("*", "*", "*", "*"), true},     {Entry("000", "000", "000", "001"), false},
-        {Entry("*", "*", "*", "010"), false},  {Entry("abc", "0", "x", "0"), true},
+        {Entry("", "", "", ""), true},        {Entry("000", "000", "000", "000"), true},
+        {Entry("*", "*", "*", "*"), true},    {Entry("000", "000", "000", "001"), false},
+        {Entry("*", "*", "*", "010"), false}, {Entry("abc", "0", "x", "0"), true},
     };
     for (const Case& c : cases)
         EXPECT_EQ(config::IsConnectSlotEmpty(c.entry), c.empty)

@@ -4,10 +4,9 @@
 #include "config/save_config.h"
 #include "tests/support/temp_folder.h"
 
-#include <gtest/gtest.h>
-
 #include <cstring>
 #include <filesystem>
+#include <gtest/gtest.h>
 #include <string>
 
 using config::CSaveConfig;

@@ -1,7 +1,7 @@
+#include "base/win32.h"
 #include "tests/support/environment.h"
 
 #include <cstdlib>
-#include "base/win32.h"
 
 namespace testing_support
 {

@@ -1,10 +1,10 @@
 #include "tests/support/temp_folder.h"
 
 #include <atomic>
-#include <random>
 #include <cstdlib>
 #include <fstream>
 #include <iterator>
+#include <random>
 
 namespace testing_support
 {
@@ -38,7 +38,10 @@ ScopedEnvironment::~ScopedEnvironment()
         ClearEnvironment(name_.c_str());
 }
 
-TempFolder::TempFolder() : path_(NewFolderPath()) { std::filesystem::create_directories(path_); }
+TempFolder::TempFolder() : path_(NewFolderPath())
+{
+    std::filesystem::create_directories(path_);
+}
 
 TempFolder::~TempFolder()
 {
