@@ -70,6 +70,8 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
 
     BeginFrameTimer(system_, 60);
     timerRaised_ = true;
+
+    CreatePages(instance);
     return true;
 }
 
@@ -101,9 +103,4 @@ bool CConfigApplication::Exit()
     }
     ReleaseBase();
     return true;
-}
-
-LRESULT CConfigApplication::WindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam)
-{
-    return OnMainDialog(window, message, wParam, lParam);
 }

@@ -38,11 +38,31 @@ public:
 
     config::CSaveConfig* Record() { return record_; }
     CSystem* System() { return system_; }
+    HWND MainTab() const { return mainTab_; }
+    HWND KeyTab() const { return keyTab_; }
+    HWND PageWindow(int index) const { return pages_[index].window; }
+    HWND KeyPageWindow(int index) const { return keyPages_[index].window; }
+    HWND CurrentPage() const { return currentPage_; }
+    HWND CurrentKeyPage() const { return currentKeyPage_; }
+
+    // Shows one page of the main tab (or of the key tab) and hides the
+    // others; an index out of range hides them all.
+    bool SelectPage(int index);
+    bool SelectKeyPage(int index);
+
+    using PageHandler = LRESULT (CConfigApplication::*)(HWND page, UINT message, WPARAM wParam,
+                                                        LPARAM lParam);
 
 private:
+    // Creates the two tab controls' items and pages and places the pages on
+    // their display areas. A page that cannot be created is left out.
+    void CreatePages(HINSTANCE instance);
+    LRESULT OnKeyConfigPage(HWND page, UINT message, WPARAM wParam, LPARAM lParam);
+
     // The main dialog's own messages: the two buttons, the close command and
     // the tab.
     LRESULT OnMainDialog(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam);
+    LRESULT OnMainTabNotify(LPARAM lParam);
     LRESULT OnSave(HWND dialog);
     void ConfirmClose(HWND dialog, const char* question);
 

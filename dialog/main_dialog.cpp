@@ -4,12 +4,12 @@
 
 #include <commctrl.h>
 
-LRESULT CConfigApplication::OnMainDialog(HWND dialog, UINT message, WPARAM wParam, LPARAM)
+LRESULT CConfigApplication::OnMainDialog(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam)
 {
     switch (message)
     {
     case WM_NOTIFY:
-        return TRUE;
+        return OnMainTabNotify(lParam);
     case WM_CLOSE:
         ConfirmClose(dialog, "コンフィグツールを閉じますか？");
         return TRUE;

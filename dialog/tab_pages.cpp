@@ -1,0 +1,172 @@
+// The two tab controls, their pages, and the routing of every message of the
+// tool to the handler of the window it belongs to.
+#include "app/config_application.h"
+#include "app/system.h"
+#include "resources/resource.h"
+
+#include <commctrl.h>
+
+namespace
+{
+
+struct PageEntry
+{
+    const char* caption;
+    std::uint32_t templateId;
+    CConfigApplication::PageHandler handler;
+};
+
+// In tab order. A page without a handler has no controls of its own yet.
+const PageEntry kPages[kPageCount] = {
+    {"グラフィック", IDD_GRAPHICS_PAGE, nullptr},
+    {"ゲーム", IDD_GAME_PAGE, nullptr},
+    {"ネットワーク", IDD_NETWORK_PAGE, nullptr},
+    {"リプレイ", IDD_REPLAY_PAGE, nullptr},
+    {"BGM", IDD_USER_MUSIC_PAGE, nullptr},
+    {"キーコンフィグ", IDD_KEY_CONFIG_PAGE, nullptr},
+    {"ラジオチャット", IDD_RADIO_CHAT_PAGE, nullptr},
+};
+
+const PageEntry kKeyPages[kKeyPageCount] = {
+    {"キーボード", IDD_KEYBOARD_PAGE, nullptr},
+    {"コントローラー", IDD_PAD_PAGE, nullptr},
+};
+
+void InsertTabItem(HWND tab, int index, const char* caption)
+{
+    TCITEMA item = {};
+    item.mask = TCIF_TEXT;
+    item.pszText = const_cast<char*>(caption);
+    SendMessageA(tab, TCM_INSERTITEMA, index, reinterpret_cast<LPARAM>(&item));
+}
+
+// The tab's client area less its tabs, in the tab's client coordinates.
+RECT DisplayArea(HWND tab)
+{
+    RECT area;
+    GetClientRect(tab, &area);
+    SendMessageA(tab, TCM_ADJUSTRECT, FALSE, reinterpret_cast<LPARAM>(&area));
+    return area;
+}
+
+void MoveOnto(HWND page, const RECT& area)
+{
+    MoveWindow(page, area.left, area.top, area.right - area.left, area.bottom - area.top, FALSE);
+}
+
+bool IsSelectionChange(LPARAM lParam, HWND tab)
+{
+    const auto* header = reinterpret_cast<const NMHDR*>(lParam);
+    return header->code == static_cast<UINT>(TCN_SELCHANGE) && header->hwndFrom == tab;
+}
+
+} // namespace
+
+void CConfigApplication::CreatePages(HINSTANCE instance)
+{
+    const HWND mainDialog = system_->GetHwnd();
+    const auto dialogProcedure = reinterpret_cast<DLGPROC>(procedure_);
+
+    mainTab_ = GetDlgItem(mainDialog, IDC_MAIN_TAB);
+    for (int index = 0; index < kPageCount; ++index)
+        InsertTabItem(mainTab_, index, kPages[index].caption);
+    const RECT pageArea = DisplayArea(mainTab_);
+    for (int index = 0; index < kPageCount; ++index)
+    {
+        pages_[index].templateId = kPages[index].templateId;
+        pages_[index].window = CreateDialogParamA(
+            instance, MAKEINTRESOURCEA(kPages[index].templateId), mainTab_, dialogProcedure, 0);
+    }
+    for (const PageSlot& page : pages_)
+        MoveOnto(page.window, pageArea);
+    SelectPage(0);
+
+    const HWND keyConfigPage = pages_[kKeyConfigPageIndex].window;
+    keyTab_ = GetDlgItem(keyConfigPage, IDC_KEY_TAB);
+    for (int index = 0; index < kKeyPageCount; ++index)
+    {
+        keyPages_[index].templateId = kKeyPages[index].templateId;
+        keyPages_[index].window =
+            CreateDialogParamA(instance, MAKEINTRESOURCEA(kKeyPages[index].templateId),
+                               keyConfigPage, dialogProcedure, 0);
+    }
+    for (int index = 0; index < kKeyPageCount; ++index)
+        InsertTabItem(keyTab_, index, kKeyPages[index].caption);
+    // The sub-pages are children of the page, not of its tab control.
+    RECT keyArea = DisplayArea(keyTab_);
+    MapWindowPoints(keyTab_, keyConfigPage, reinterpret_cast<POINT*>(&keyArea), 2);
+    for (const PageSlot& page : keyPages_)
+        MoveOnto(page.window, keyArea);
+    SelectKeyPage(0);
+}
+
+bool CConfigApplication::SelectPage(int index)
+{
+    for (int position = 0; position < kPageCount; ++position)
+    {
+        if (position == index)
+        {
+            ShowWindow(pages_[position].window, SW_SHOW);
+            currentPage_ = pages_[position].window;
+        }
+        else
+        {
+            ShowWindow(pages_[position].window, SW_HIDE);
+        }
+    }
+    return true;
+}
+
+bool CConfigApplication::SelectKeyPage(int index)
+{
+    for (int position = 0; position < kKeyPageCount; ++position)
+    {
+        if (position == index)
+        {
+            ShowWindow(keyPages_[position].window, SW_SHOW);
+            currentKeyPage_ = keyPages_[position].window;
+        }
+        else
+        {
+            ShowWindow(keyPages_[position].window, SW_HIDE);
+        }
+    }
+    return true;
+}
+
+LRESULT CConfigApplication::WindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam)
+{
+    for (int index = 0; index < kPageCount; ++index)
+    {
+        if (window != pages_[index].window)
+            continue;
+        if (index == kKeyConfigPageIndex)
+            return OnKeyConfigPage(window, message, wParam, lParam);
+        const PageHandler handler = kPages[index].handler;
+        return handler != nullptr ? (this->*handler)(window, message, wParam, lParam) : FALSE;
+    }
+    for (int index = 0; index < kKeyPageCount; ++index)
+    {
+        if (window != keyPages_[index].window)
+            continue;
+        const PageHandler handler = kKeyPages[index].handler;
+        return handler != nullptr ? (this->*handler)(window, message, wParam, lParam) : FALSE;
+    }
+    return OnMainDialog(window, message, wParam, lParam);
+}
+
+LRESULT CConfigApplication::OnKeyConfigPage(HWND, UINT message, WPARAM, LPARAM lParam)
+{
+    if (message != WM_NOTIFY)
+        return FALSE;
+    if (IsSelectionChange(lParam, keyTab_))
+        SelectKeyPage(static_cast<int>(SendMessageA(keyTab_, TCM_GETCURSEL, 0, 0)));
+    return TRUE;
+}
+
+LRESULT CConfigApplication::OnMainTabNotify(LPARAM lParam)
+{
+    if (IsSelectionChange(lParam, mainTab_))
+        SelectPage(static_cast<int>(SendMessageA(mainTab_, TCM_GETCURSEL, 0, 0)));
+    return TRUE;
+}
