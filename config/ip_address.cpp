@@ -1,0 +1,125 @@
+#include "config/ip_address.h"
+
+#include "base/cp932.h"
+#include "config/save_config.h"
+
+#include <climits>
+#include <cstdio>
+#include <cstring>
+
+namespace config
+{
+namespace
+{
+
+bool IsSpace(char c)
+{
+    return c == ' ' || (c >= '\t' && c <= '\r');
+}
+
+bool IsDigit(char c)
+{
+    return c >= '0' && c <= '9';
+}
+
+} // namespace
+
+int ReadLeadingInteger(const char* text)
+{
+    while (IsSpace(*text))
+        ++text;
+    const bool negative = *text == '-';
+    if (*text == '-' || *text == '+')
+        ++text;
+    // Counted towards the negative end, which holds one more value.
+    long long value = 0;
+    for (; IsDigit(*text); ++text)
+    {
+        value = value * 10 - (*text - '0');
+        if (value < INT_MIN)
+            return negative ? INT_MIN : INT_MAX;
+    }
+    if (!negative)
+        return value < -INT_MAX ? INT_MAX : static_cast<int>(-value);
+    return static_cast<int>(value);
+}
+
+bool ReadOctet(const char* text, char (&octet)[4])
+{
+    if (text[0] == '\0')
+        return false;
+    if (std::strcmp(text, "*") == 0)
+    {
+        std::memset(octet, 0, sizeof octet);
+        octet[0] = '*';
+        return true;
+    }
+    const int value = ReadLeadingInteger(text);
+    if (value < 0 || value > 255)
+        return false;
+    std::snprintf(octet, sizeof octet, "%3.3d", value);
+    return true;
+}
+
+int OctetValue(const char (&octet)[4])
+{
+    char text[sizeof octet + 1] = {};
+    std::memcpy(text, octet, sizeof octet);
+    return ReadLeadingInteger(text);
+}
+
+std::string ConnectLine(const IpEntry& entry)
+{
+    char line[64];
+    std::snprintf(line, sizeof line, "%d.%d.%d.%d", OctetValue(entry.octets[0]),
+                  OctetValue(entry.octets[1]), OctetValue(entry.octets[2]),
+                  OctetValue(entry.octets[3]));
+    return line;
+}
+
+std::string ListedLine(const IpEntry& entry)
+{
+    char line[32];
+    std::snprintf(line, sizeof line, "%.4s.%.4s.%.4s.%.4s", entry.octets[0], entry.octets[1],
+                  entry.octets[2], entry.octets[3]);
+    return line;
+}
+
+std::uint16_t ReadPort(const char* text)
+{
+    return static_cast<std::uint16_t>(static_cast<unsigned int>(ReadLeadingInteger(text)));
+}
+
+void CopyId(char (&id)[kIdCapacity], const char* text)
+{
+    std::size_t kept = 0;
+    while (text[kept] != '\0')
+    {
+        const std::size_t width =
+            base::IsLeadByte(static_cast<std::uint8_t>(text[kept])) && text[kept + 1] != '\0' ? 2
+                                                                                              : 1;
+        if (kept + width > kIdTextLimit)
+            break;
+        kept += width;
+    }
+    std::memset(id, 0, sizeof id);
+    std::memcpy(id, text, kept);
+}
+
+std::string IdText(const char (&id)[kIdCapacity])
+{
+    const void* end = std::memchr(id, '\0', sizeof id);
+    return std::string(id, end != nullptr ? static_cast<const char*>(end) : id + sizeof id);
+}
+
+int FirstEmptyConnectSlot(const ConfigNetwork& network)
+{
+    for (int slot = 0; slot < kConnectSlotCount; ++slot)
+    {
+        if (IsConnectSlotEmpty(network.connectList[slot]))
+            return slot;
+    }
+    return -1;
+}
+
+} // namespace config
