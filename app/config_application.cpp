@@ -72,6 +72,7 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
     timerRaised_ = true;
 
     CreatePages(instance);
+    InitNetworkPage();
     return true;
 }
 

@@ -53,6 +53,14 @@ public:
     using PageHandler = LRESULT (CConfigApplication::*)(HWND page, UINT message, WPARAM wParam,
                                                         LPARAM lParam);
 
+    // Network page (ネットワーク) and the IP entry dialog its add buttons run.
+    void InitNetworkPage();
+    LRESULT OnNetworkPage(HWND page, UINT message, WPARAM wParam, LPARAM lParam);
+    static INT_PTR CALLBACK IpEntryDialogProc(HWND dialog, UINT message, WPARAM wParam,
+                                              LPARAM lParam);
+    LRESULT OnIpEntryDialog(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam);
+    bool ReadIpEntry(HWND dialog);
+
 private:
     // Creates the two tab controls' items and pages and places the pages on
     // their display areas. A page that cannot be created is left out.

@@ -20,7 +20,7 @@ struct PageEntry
 const PageEntry kPages[kPageCount] = {
     {"グラフィック", IDD_GRAPHICS_PAGE, nullptr},
     {"ゲーム", IDD_GAME_PAGE, nullptr},
-    {"ネットワーク", IDD_NETWORK_PAGE, nullptr},
+    {"ネットワーク", IDD_NETWORK_PAGE, &CConfigApplication::OnNetworkPage},
     {"リプレイ", IDD_REPLAY_PAGE, nullptr},
     {"BGM", IDD_USER_MUSIC_PAGE, nullptr},
     {"キーコンフィグ", IDD_KEY_CONFIG_PAGE, nullptr},

@@ -19,5 +19,27 @@
 #define IDD_PAD_PAGE 4200
 #define IDC_KEY_TAB 4010
 
-// IP entry dialog.
+// Network page: the common and lobby settings, the ID for direct connections
+// and the three address lists (接続, 許可, 拒否) with their buttons.
+#define IDC_NETWORK_LOBBY_ID 3010
+#define IDC_NETWORK_PORT 3011
+#define IDC_NETWORK_USE_UPNP 3012
+#define IDC_NETWORK_DIRECT_ID 3013
+#define IDC_NETWORK_PLAY_BGM 3014
+#define IDC_NETWORK_KEY_RESPONSE 3016
+#define IDC_DENY_DELETE 3017
+#define IDC_DENY_ADD 3018
+#define IDC_DENY_LIST 3019
+#define IDC_ALLOW_DELETE 3020
+#define IDC_ALLOW_ADD 3021
+#define IDC_ALLOW_LIST 3022
+#define IDC_CONNECT_DELETE 3023
+#define IDC_CONNECT_LIST 3024
+#define IDC_CONNECT_ADD 3025
+
+// IP entry dialog: its four octet fields, left to right.
 #define IDD_IP_ENTRY 114
+#define IDC_IP_OCTET1 3026
+#define IDC_IP_OCTET2 3027
+#define IDC_IP_OCTET3 3028
+#define IDC_IP_OCTET4 3029

@@ -1,0 +1,259 @@
+// The ネットワーク page: key response, port, music and UPnP switches, the two
+// IDs and the three address lists, with the IP entry dialog that the add
+// buttons run. Every change goes into the record at once.
+#include "app/config_application.h"
+#include "app/system.h"
+#include "config/ip_address.h"
+#include "resources/resource.h"
+
+#include <cstdio>
+#include <string>
+
+namespace
+{
+
+constexpr int kNetworkPageIndex = 2;
+constexpr char kErrorCaption[] = "Error";
+constexpr int kOctetFields[4] = {IDC_IP_OCTET1, IDC_IP_OCTET2, IDC_IP_OCTET3, IDC_IP_OCTET4};
+
+// One address list of the page: its list box, its two buttons, the record's
+// operations behind them and how an address reads in it.
+struct AddressList
+{
+    int listBox;
+    int addButton;
+    int deleteButton;
+    bool (config::CSaveConfig::*add)(const config::IpEntry& entry);
+    bool (config::CSaveConfig::*remove)(std::int32_t index);
+    std::string (*line)(const config::IpEntry& entry);
+    const char* addFailure;
+};
+
+const AddressList kAddressLists[] = {
+    {IDC_CONNECT_LIST, IDC_CONNECT_ADD, IDC_CONNECT_DELETE, &config::CSaveConfig::AddConnectEntry,
+     &config::CSaveConfig::RemoveConnectEntry, config::ConnectLine,
+     "接続IPアドレスの登録は２４件までです。"},
+    {IDC_ALLOW_LIST, IDC_ALLOW_ADD, IDC_ALLOW_DELETE, &config::CSaveConfig::AddAllowEntry,
+     &config::CSaveConfig::RemoveAllowEntry, config::ListedLine,
+     "許可IPアドレスの追加に失敗しました。"},
+    {IDC_DENY_LIST, IDC_DENY_ADD, IDC_DENY_DELETE, &config::CSaveConfig::AddDenyEntry,
+     &config::CSaveConfig::RemoveDenyEntry, config::ListedLine,
+     "拒否IPアドレスの追加に失敗しました。"},
+};
+
+const AddressList* ListAddedBy(int button)
+{
+    for (const AddressList& list : kAddressLists)
+    {
+        if (list.addButton == button)
+            return &list;
+    }
+    return nullptr;
+}
+
+const AddressList* ListDeletedBy(int button)
+{
+    for (const AddressList& list : kAddressLists)
+    {
+        if (list.deleteButton == button)
+            return &list;
+    }
+    return nullptr;
+}
+
+void AddLine(HWND page, int listBox, const std::string& line)
+{
+    SendDlgItemMessageA(page, listBox, LB_ADDSTRING, 0, reinterpret_cast<LPARAM>(line.c_str()));
+}
+
+std::uint32_t CheckedFlag(HWND page, int checkBox)
+{
+    return SendDlgItemMessageA(page, checkBox, BM_GETCHECK, 0, 0) == BST_CHECKED ? 1 : 0;
+}
+
+void SetChecked(HWND page, int checkBox, std::uint32_t flag)
+{
+    SendDlgItemMessageA(page, checkBox, BM_SETCHECK, flag != 0 ? BST_CHECKED : BST_UNCHECKED, 0);
+}
+
+// Stores an entered address and shows it. The lines of a list stand for the
+// record's entries in order, as the delete button assumes. A 接続 address
+// takes the first free slot, which can be the line of an all-zero address
+// entered before: such an address leaves its slot free, and its line gives
+// way to the address that now fills the slot.
+void AddAddress(HWND page, const AddressList& list, config::CSaveConfig& record,
+                const config::IpEntry& entry)
+{
+    // Looked up before the address fills it.
+    const int slot = config::FirstEmptyConnectSlot(*record.Network());
+    if (!(record.*list.add)(entry))
+    {
+        MessageBoxA(page, list.addFailure, kErrorCaption, MB_OK);
+        return;
+    }
+    const std::string line = list.line(entry);
+    const HWND listBox = GetDlgItem(page, list.listBox);
+    if (list.listBox == IDC_CONNECT_LIST && slot < SendMessageA(listBox, LB_GETCOUNT, 0, 0))
+    {
+        SendMessageA(listBox, LB_DELETESTRING, slot, 0);
+        SendMessageA(listBox, LB_INSERTSTRING, slot, reinterpret_cast<LPARAM>(line.c_str()));
+        return;
+    }
+    AddLine(page, list.listBox, line);
+}
+
+void DeleteAddress(HWND page, const AddressList& list, config::CSaveConfig& record)
+{
+    const auto selected =
+        static_cast<std::int32_t>(SendDlgItemMessageA(page, list.listBox, LB_GETCURSEL, 0, 0));
+    if (!(record.*list.remove)(selected))
+    {
+        MessageBoxA(page, "削除するIPアドレスをリストから選択してください。", kErrorCaption, MB_OK);
+        return;
+    }
+    SendDlgItemMessageA(page, list.listBox, LB_DELETESTRING, selected, 0);
+}
+
+} // namespace
+
+void CConfigApplication::InitNetworkPage()
+{
+    const HWND page = pages_[kNetworkPageIndex].window;
+    const config::ConfigNetwork& network = *record_->Network();
+
+    // Each text set here comes back at once as the edit's update, so the
+    // record's fields are read into copies first.
+    SetDlgItemTextA(page, IDC_NETWORK_LOBBY_ID, config::IdText(network.lobbyId).c_str());
+    SetDlgItemTextA(page, IDC_NETWORK_DIRECT_ID, config::IdText(network.directId).c_str());
+    char port[16];
+    std::snprintf(port, sizeof port, "%d", network.port);
+    SetDlgItemTextA(page, IDC_NETWORK_PORT, port);
+
+    SetChecked(page, IDC_NETWORK_USE_UPNP, network.useUpnp);
+    SetChecked(page, IDC_NETWORK_PLAY_BGM, network.playBgm);
+
+    for (const char* choice : {"1", "2", "3", "4", "5"})
+        SendDlgItemMessageA(page, IDC_NETWORK_KEY_RESPONSE, CB_ADDSTRING, 0,
+                            reinterpret_cast<LPARAM>(choice));
+    SendDlgItemMessageA(page, IDC_NETWORK_KEY_RESPONSE, CB_SETCURSEL, network.keyResponse, 0);
+
+    for (const config::IpEntry& slot : network.connectList)
+    {
+        if (!config::IsConnectSlotEmpty(slot))
+            AddLine(page, IDC_CONNECT_LIST, config::ConnectLine(slot));
+    }
+    for (std::uint32_t index = 0; index < network.allowCount; ++index)
+        AddLine(page, IDC_ALLOW_LIST, config::ListedLine(*record_->GetAllowEntry(index)));
+    for (std::uint32_t index = 0; index < network.denyCount; ++index)
+        AddLine(page, IDC_DENY_LIST, config::ListedLine(*record_->GetDenyEntry(index)));
+}
+
+LRESULT CConfigApplication::OnNetworkPage(HWND page, UINT message, WPARAM wParam, LPARAM)
+{
+    if (message != WM_COMMAND)
+        return 0;
+    const int control = LOWORD(wParam);
+    const int code = HIWORD(wParam);
+    config::ConfigNetwork& network = *record_->Network();
+
+    if (code == EN_UPDATE)
+    {
+        // More than an ID keeps, so that it is cut at a character's end.
+        char text[64] = {};
+        if (control == IDC_NETWORK_PORT)
+        {
+            GetDlgItemTextA(page, control, text, 30);
+            network.port = config::ReadPort(text);
+            return 1;
+        }
+        GetDlgItemTextA(page, control, text, sizeof text);
+        if (control == IDC_NETWORK_LOBBY_ID)
+            config::CopyId(network.lobbyId, text);
+        else if (control == IDC_NETWORK_DIRECT_ID)
+            config::CopyId(network.directId, text);
+    }
+    else if (code == CBN_SELCHANGE && control == IDC_NETWORK_KEY_RESPONSE)
+    {
+        const LRESULT choice = SendDlgItemMessageA(page, control, CB_GETCURSEL, 0, 0);
+        if (choice != CB_ERR)
+            network.keyResponse = static_cast<std::uint8_t>(choice);
+    }
+    else if (code == BN_CLICKED)
+    {
+        if (control == IDC_NETWORK_USE_UPNP)
+            network.useUpnp = CheckedFlag(page, control);
+        else if (control == IDC_NETWORK_PLAY_BGM)
+            network.playBgm = CheckedFlag(page, control);
+        else if (const AddressList* list = ListAddedBy(control))
+        {
+            if (DialogBoxParamA(system_->GetInstance(), MAKEINTRESOURCEA(IDD_IP_ENTRY),
+                                system_->GetHwnd(), IpEntryDialogProc,
+                                reinterpret_cast<LPARAM>(this)) == 1)
+                AddAddress(page, *list, *record_, ipEntry_);
+        }
+        else if (const AddressList* list = ListDeletedBy(control))
+            DeleteAddress(page, *list, *record_);
+    }
+    return 1;
+}
+
+INT_PTR CALLBACK CConfigApplication::IpEntryDialogProc(HWND dialog, UINT message, WPARAM wParam,
+                                                       LPARAM lParam)
+{
+    if (message == WM_INITDIALOG)
+        SetWindowLongPtrA(dialog, GWLP_USERDATA, lParam);
+    auto* application =
+        reinterpret_cast<CConfigApplication*>(GetWindowLongPtrA(dialog, GWLP_USERDATA));
+    if (application == nullptr)
+        return 0;
+    return application->OnIpEntryDialog(dialog, message, wParam, lParam);
+}
+
+LRESULT CConfigApplication::OnIpEntryDialog(HWND dialog, UINT message, WPARAM wParam, LPARAM)
+{
+    switch (message)
+    {
+    case WM_INITDIALOG:
+        for (int field : kOctetFields)
+        {
+            SetDlgItemTextA(dialog, field, "");
+            SendDlgItemMessageA(dialog, field, EM_LIMITTEXT, 3, 0);
+        }
+        return 1;
+    case WM_CLOSE:
+        EndDialog(dialog, 0);
+        return 1;
+    case WM_COMMAND:
+        if (LOWORD(wParam) == IDOK)
+        {
+            // A refused field keeps the dialog open for another try.
+            if (ReadIpEntry(dialog))
+                EndDialog(dialog, 1);
+        }
+        else if (LOWORD(wParam) == IDCANCEL)
+        {
+            EndDialog(dialog, 0);
+        }
+        return 1;
+    default:
+        return 0;
+    }
+}
+
+// The octets are stored one by one as they pass; after a refusal the entry
+// holds a mixture, which nothing uses before the next full success.
+bool CConfigApplication::ReadIpEntry(HWND dialog)
+{
+    for (int octet = 0; octet < 4; ++octet)
+    {
+        char text[30] = {};
+        GetDlgItemTextA(dialog, kOctetFields[octet], text, sizeof text);
+        if (!config::ReadOctet(text, ipEntry_.octets[octet]))
+        {
+            MessageBoxA(dialog, "IPアドレスには0～255までの数字を入力してください。", kErrorCaption,
+                        MB_OK);
+            return false;
+        }
+    }
+    return true;
+}
