@@ -162,21 +162,6 @@ TEST(SlotWheel, ANotchOf120Scores12AndPressesWheelUp)
     }
 }
 
-TEST(SlotMouse, ButtonsFollowTheMouseMap)
-{
-    InputSlot slot = FreshSlot();
-    slot.mouseMap[0] = 1;
-    slot.mouseMap[1] = 0;
-    slot.mouseMap[2] = 200;
-    DIMOUSESTATE2 mouse = {};
-    mouse.rgbButtons[1] = 1;
-    mouse.rgbButtons[2] = 1;
-    ReadMouse(slot, mouse);
-    EXPECT_EQ(slot.current[0], 1u);
-    EXPECT_EQ(slot.current[1], 0u);
-    EXPECT_EQ(slot.current[2], 0u);
-}
-
 TEST(SlotKeyboard, DefaultKeysFeedTheVirtualButtonsAndFixedKeysTheirOwn)
 {
     const char* defaults[] = {"UP",      "DOWN",     "LEFT",   "RIGHT",   "W",       "S",
@@ -203,7 +188,7 @@ TEST(SlotKeyboard, DefaultKeysFeedTheVirtualButtonsAndFixedKeysTheirOwn)
     }
 }
 
-TEST(SlotOverrides, MovementKeysForceFullDeflectionAndNegativeWins)
+TEST(SlotOverrides, MovementKeysForceFullDeflectionOtherwiseTheDeviceOrCentreHolds)
 {
     struct Case
     {
@@ -239,24 +224,18 @@ TEST(SlotOverrides, MovementKeysForceFullDeflectionAndNegativeWins)
     both.current[kFirstVirtualButton + 5] = 1;
     ApplyDigitalOverrides(both);
     EXPECT_FLOAT_EQ(both.leftY, -1.0f);
-}
 
-TEST(SlotOverrides, WithoutKeysSticksKeepADevicesValuesOrCentre)
-{
-    InputSlot analog = FreshSlot();
-    analog.analogValid = 1;
-    analog.leftX = 0.3f;
-    analog.rightY = -0.7f;
-    ApplyDigitalOverrides(analog);
-    EXPECT_FLOAT_EQ(analog.leftX, 0.3f);
-    EXPECT_FLOAT_EQ(analog.rightY, -0.7f);
-
-    InputSlot stale = FreshSlot();
-    stale.leftX = 0.3f;
-    stale.rightY = -0.7f;
-    ApplyDigitalOverrides(stale);
-    EXPECT_FLOAT_EQ(stale.leftX, 0.0f);
-    EXPECT_FLOAT_EQ(stale.rightY, 0.0f);
+    // Without keys the sticks keep a device's values, or centre without one.
+    for (std::uint32_t analogValid : {0u, 1u})
+    {
+        InputSlot slot = FreshSlot();
+        slot.analogValid = analogValid;
+        slot.leftX = 0.3f;
+        slot.rightY = -0.7f;
+        ApplyDigitalOverrides(slot);
+        EXPECT_FLOAT_EQ(slot.leftX, analogValid != 0 ? 0.3f : 0.0f);
+        EXPECT_FLOAT_EQ(slot.rightY, analogValid != 0 ? -0.7f : 0.0f);
+    }
 }
 
 TEST(SlotPadFrame, ButtonsComeThroughTheMapOfTheDeviceThatDeliveredTheFrame)

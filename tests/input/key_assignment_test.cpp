@@ -286,21 +286,4 @@ TEST(PadCapture, NothingHappensWithoutAButtonOrAnAction)
     EXPECT_FALSE(page.Decide(24).happened);
 }
 
-TEST(PadCapture, BindingAPlayerLoadsItsCodesAndController)
-{
-    config::PadConfig player = {};
-    for (int action = 0; action < kActionCount; ++action)
-        player.buttons[action] = static_cast<std::uint32_t>(47 - action);
-    player.device = 2;
-    InputSlot slot;
-    ResetSlot(slot, 0, false);
-    BindPlayerToSlot(player, slot);
-    EXPECT_EQ(slot.joystickIndex, 2);
-    for (int action = 0; action < kActionCount; ++action)
-    {
-        EXPECT_EQ(slot.joyMap[action], player.buttons[action]);
-        EXPECT_EQ(slot.xinputMap[action], player.buttons[action]);
-    }
-}
-
 } // namespace

@@ -224,32 +224,6 @@ TEST(XInputFrame, TriggersPressFrom128)
     }
 }
 
-TEST(XInputFrame, ButtonsReachTheirEntries)
-{
-    const std::pair<std::uint16_t, int> cases[] = {
-        {XINPUT_GAMEPAD_DPAD_UP, kDpadUp},
-        {XINPUT_GAMEPAD_DPAD_DOWN, kDpadDown},
-        {XINPUT_GAMEPAD_DPAD_LEFT, kDpadLeft},
-        {XINPUT_GAMEPAD_DPAD_RIGHT, kDpadRight},
-        {XINPUT_GAMEPAD_LEFT_THUMB, kLeftStickPush},
-        {XINPUT_GAMEPAD_RIGHT_THUMB, kRightStickPush},
-        {XINPUT_GAMEPAD_A, kButton1},
-        {XINPUT_GAMEPAD_B, kButton2},
-        {XINPUT_GAMEPAD_X, kButton3},
-        {XINPUT_GAMEPAD_Y, kButton4},
-        {XINPUT_GAMEPAD_LEFT_SHOULDER, kButton7},
-        {XINPUT_GAMEPAD_RIGHT_SHOULDER, kButton8},
-        {XINPUT_GAMEPAD_START, kButton9},
-        {XINPUT_GAMEPAD_BACK, kButton10},
-    };
-    for (const auto& [mask, entry] : cases)
-    {
-        XINPUT_GAMEPAD pad = {};
-        pad.wButtons = mask;
-        EXPECT_EQ(FrameOf(pad), Entries{entry}) << "mask " << mask;
-    }
-}
-
 TEST(XInputFrame, RightStickDirectionsKeepXInputsSignAndFollowTheOptions)
 {
     struct Case
