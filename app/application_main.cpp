@@ -1,10 +1,11 @@
 #include "app/application_main.h"
 
 #include "app/system.h"
+#include "input/input.h"
 
 CApplicationMain::CApplicationMain()
-    : system_(nullptr), graphicsDevice_(nullptr), comObject_(nullptr), textInput_(nullptr),
-      timerRaised_(false)
+    : system_(nullptr), graphicsDevice_(nullptr), input_(nullptr), comObject_(nullptr),
+      textInput_(nullptr), timerRaised_(false)
 {
 }
 
@@ -46,6 +47,11 @@ const char* CApplicationMain::GetClassName() const
 
 void CApplicationMain::ReleaseBase()
 {
+    if (input_ != nullptr)
+    {
+        delete input_;
+        input_ = nullptr;
+    }
     if (system_ != nullptr)
     {
         delete system_;

@@ -3,6 +3,10 @@
 #include "base/win32.h"
 
 class CSystem;
+namespace input
+{
+class CInput;
+}
 
 // The in-house application framework's life cycle. The game's own start-up
 // (top-level window, graphics device, COM) lives in the game; the tool
@@ -32,6 +36,7 @@ protected:
 
     CSystem* system_;
     void* graphicsDevice_;
+    input::CInput* input_;
     void* comObject_;
     void* textInput_;
     bool timerRaised_;

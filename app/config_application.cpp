@@ -1,6 +1,7 @@
 #include "app/config_application.h"
 
 #include "app/system.h"
+#include "input/input.h"
 #include "resources/resource.h"
 
 #include <commctrl.h>
@@ -67,6 +68,13 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
                                      reinterpret_cast<DLGPROC>(procedure), nullptr))
         return false;
     procedure_ = procedure;
+
+    input_ = new (std::nothrow) input::CInput();
+    if (input_ == nullptr)
+        return false;
+    const input::InputWindow inputWindow = {system_->GetInstance(), system_->GetHwnd()};
+    if (!input_->Init(&inputWindow))
+        return false;
 
     BeginFrameTimer(system_, 60);
     timerRaised_ = true;

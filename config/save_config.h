@@ -96,10 +96,10 @@ public:
     bool ResetRadioChat();
     bool ResetKeyboardKeys();
     bool ResetPadButtons(std::uint8_t player);
-
-private:
+    // Every section to its defaults, as for a missing file.
     void ResetAll();
 
+private:
     ConfigGraphics graphics_;
     ConfigGame game_;
     ConfigNetwork network_;

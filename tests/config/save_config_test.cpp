@@ -53,13 +53,7 @@ struct Image
 CSaveConfig Defaults()
 {
     CSaveConfig record;
-    record.ResetGraphics();
-    record.ResetGame();
-    record.ResetNetwork();
-    record.ResetReplay();
-    record.ResetUserBgm();
-    record.ResetKeys();
-    record.ResetRadioChat();
+    record.ResetAll();
     return record;
 }
 

@@ -70,13 +70,7 @@ TEST(SaveFile, MissingFileIsCreatedWithEveryDefault)
     const std::vector<std::uint8_t> bytes = ReadBytes(folder.SettingsFile());
     ASSERT_EQ(bytes.size(), 6876u);
     CSaveConfig defaults;
-    defaults.ResetGraphics();
-    defaults.ResetGame();
-    defaults.ResetNetwork();
-    defaults.ResetReplay();
-    defaults.ResetUserBgm();
-    defaults.ResetKeys();
-    defaults.ResetRadioChat();
+    defaults.ResetAll();
     EXPECT_EQ(bytes, defaults.SaveToBytes());
     EXPECT_FALSE(fs::exists(folder.SettingsFile() + ".new"));
 }

@@ -17,13 +17,7 @@ constexpr char kCloseQuestion[] = "コンフィグツールを閉じますか？
 std::vector<std::uint8_t> DefaultImage()
 {
     config::CSaveConfig record;
-    record.ResetGraphics();
-    record.ResetGame();
-    record.ResetNetwork();
-    record.ResetReplay();
-    record.ResetUserBgm();
-    record.ResetKeys();
-    record.ResetRadioChat();
+    record.ResetAll();
     return record.SaveToBytes();
 }
 
