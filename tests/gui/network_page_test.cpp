@@ -196,24 +196,12 @@ void Select(HWND page, int list, int line)
     SendDlgItemMessageA(page, list, LB_SETCURSEL, line, 0);
 }
 
-config::CSaveConfig Defaults()
-{
-    config::CSaveConfig record;
-    record.ResetGraphics();
-    record.ResetGame();
-    record.ResetNetwork();
-    record.ResetReplay();
-    record.ResetUserBgm();
-    record.ResetKeys();
-    record.ResetRadioChat();
-    return record;
-}
-
 } // namespace
 
 TEST(NetworkPage, StartFillsEveryControlFromTheFileAndChangesNothing)
 {
-    config::CSaveConfig record = Defaults();
+    config::CSaveConfig record;
+    record.ResetAll();
     config::ConfigNetwork& network = *record.Network();
     network.port = 4321;
     std::strcpy(network.lobbyId, "ロビー表");
