@@ -72,6 +72,10 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
     timerRaised_ = true;
 
     CreatePages(instance);
+    InitGraphicsPage();
+    InitGamePage();
+    InitReplayPage();
+    InitRadioChatPage();
     return true;
 }
 
