@@ -99,7 +99,7 @@ TEST(ReplayPage, RowsLieInTwoColumnsOfFifteen)
         const int row = left ? replay - 1 : replay - 16;
         const HWND label = gui::FindStatic(page, "リプレイ" + std::to_string(replay));
         const HWND box = tool.Control(page, LockBox(replay));
-        EXPECT_TRUE(gui::LiesAt(page, label, {left ? 3 : 118, 23 + 13 * row, 27, 8})) << replay;
+        EXPECT_TRUE(gui::LiesAt(page, label, {left ? 3 : 118, 23 + 13 * row, 31, 8})) << replay;
         EXPECT_TRUE(gui::LiesAt(page, box, {left ? 35 : 159, 22 + 13 * row, 30, 10})) << replay;
         EXPECT_TRUE(gui::IsCheckBox(box)) << replay;
         EXPECT_EQ(gui::WindowText(box), "ロック") << replay;
