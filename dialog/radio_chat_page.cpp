@@ -27,7 +27,8 @@ void KeepMessage(HWND edit, config::RadioChatEntry* entry)
     const int capacity = GetWindowTextLengthA(edit) + 1;
     std::string text(static_cast<std::size_t>(capacity), '\0');
     const int length = GetWindowTextA(edit, text.data(), capacity);
-    const std::size_t kept = dialog::KeptRadioChatLength(text.data(), length);
+    const std::size_t kept =
+        dialog::KeptRadioChatLength(text.data(), static_cast<std::size_t>(length));
     std::memcpy(entry->text, text.data(), kept);
     entry->text[kept] = '\0';
 }

@@ -1,7 +1,6 @@
 // The decisions of the value pages that do not need a window.
 #include "dialog/page_values.h"
 
-#include <cstring>
 #include <gtest/gtest.h>
 #include <string>
 
@@ -17,16 +16,6 @@ TEST(VolumeSlider, OnlyTheLeftEndMeansSilence)
     } cases[] = {{-3000, -10000}, {-2999, -2999}, {-1500, -1500}, {-10, -10}, {0, 0}};
     for (const auto& c : cases)
         EXPECT_EQ(VolumeAtSliderPosition(c.position), c.volume) << c.position;
-}
-
-TEST(Resolutions, UseTheJapaneseMultiplicationSign)
-{
-    EXPECT_STREQ(dialog::kResolutionNames[0], "640\x81\x7E"
-                                              "480");
-    EXPECT_STREQ(dialog::kResolutionNames[8], "1920\x81\x7E"
-                                              "1080");
-    for (const char* name : dialog::kResolutionNames)
-        EXPECT_NE(std::strstr(name, "\x81\x7E"), nullptr) << name;
 }
 
 TEST(RadioChatText, KeepsAtMost37BytesAndNeverHalfACharacter)

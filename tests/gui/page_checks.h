@@ -116,8 +116,7 @@ struct Placement
 };
 
 // Whether a control lies where the template puts it, in its page's dialog
-// units. The height of a drop-down list (that of its open list) is not
-// compared: Wine reports the open list without the closed box above it.
+// units.
 inline ::testing::AssertionResult LiesAt(HWND page, HWND control, const Placement& expected)
 {
     if (control == nullptr)
@@ -130,13 +129,8 @@ inline ::testing::AssertionResult LiesAt(HWND page, HWND control, const Placemen
     RECT actual;
     GetWindowRect(control, &actual);
     MapWindowPoints(nullptr, page, reinterpret_cast<POINT*>(&actual), 2);
-
-    char className[16] = {};
-    GetClassNameA(control, className, sizeof className);
-    const bool heightCounts = _stricmp(className, "ComboBox") != 0;
     if (actual.left == origin.left && actual.top == origin.top &&
-        actual.right - actual.left == size.right &&
-        (!heightCounts || actual.bottom - actual.top == size.bottom))
+        actual.right - actual.left == size.right && actual.bottom - actual.top == size.bottom)
         return ::testing::AssertionSuccess();
     return ::testing::AssertionFailure()
            << "at " << actual.left << "," << actual.top << " size " << actual.right - actual.left
