@@ -80,7 +80,11 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
     timerRaised_ = true;
 
     CreatePages(instance);
+    InitGraphicsPage();
+    InitGamePage();
     InitNetworkPage();
+    InitReplayPage();
+    InitRadioChatPage();
     return true;
 }
 

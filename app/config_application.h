@@ -23,6 +23,10 @@ struct SubclassedEdit
 inline constexpr int kPageCount = 7;
 inline constexpr int kKeyPageCount = 2;
 inline constexpr int kKeyConfigPageIndex = 5;
+inline constexpr int kGraphicsPageIndex = 0;
+inline constexpr int kGamePageIndex = 1;
+inline constexpr int kReplayPageIndex = 3;
+inline constexpr int kRadioChatPageIndex = 6;
 
 class CConfigApplication : public CApplicationMain
 {
@@ -52,6 +56,22 @@ public:
 
     using PageHandler = LRESULT (CConfigApplication::*)(HWND page, UINT message, WPARAM wParam,
                                                         LPARAM lParam);
+
+    // Graphics page: screen size, HDR, trail quality, full screen, movies.
+    bool InitGraphicsPage();
+    LRESULT OnGraphicsPage(HWND page, UINT message, WPARAM wParam, LPARAM lParam);
+
+    // Game page: options, the three volume sliders and the game's choices.
+    bool InitGamePage();
+    LRESULT OnGamePage(HWND page, UINT message, WPARAM wParam, LPARAM lParam);
+
+    // Replay page: saving replays and the lock of each of the thirty.
+    bool InitReplayPage();
+    LRESULT OnReplayPage(HWND page, UINT message, WPARAM wParam, LPARAM lParam);
+
+    // Radio-chat page: the twelve function-key messages and their receivers.
+    bool InitRadioChatPage();
+    LRESULT OnRadioChatPage(HWND page, UINT message, WPARAM wParam, LPARAM lParam);
 
     // Network page (ネットワーク) and the IP entry dialog its add buttons run.
     void InitNetworkPage();

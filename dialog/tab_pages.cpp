@@ -18,13 +18,13 @@ struct PageEntry
 
 // In tab order. A page without a handler has no controls of its own yet.
 const PageEntry kPages[kPageCount] = {
-    {"グラフィック", IDD_GRAPHICS_PAGE, nullptr},
-    {"ゲーム", IDD_GAME_PAGE, nullptr},
+    {"グラフィック", IDD_GRAPHICS_PAGE, &CConfigApplication::OnGraphicsPage},
+    {"ゲーム", IDD_GAME_PAGE, &CConfigApplication::OnGamePage},
     {"ネットワーク", IDD_NETWORK_PAGE, &CConfigApplication::OnNetworkPage},
-    {"リプレイ", IDD_REPLAY_PAGE, nullptr},
+    {"リプレイ", IDD_REPLAY_PAGE, &CConfigApplication::OnReplayPage},
     {"BGM", IDD_USER_MUSIC_PAGE, nullptr},
     {"キーコンフィグ", IDD_KEY_CONFIG_PAGE, nullptr},
-    {"ラジオチャット", IDD_RADIO_CHAT_PAGE, nullptr},
+    {"ラジオチャット", IDD_RADIO_CHAT_PAGE, &CConfigApplication::OnRadioChatPage},
 };
 
 const PageEntry kKeyPages[kKeyPageCount] = {

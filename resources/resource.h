@@ -43,3 +43,35 @@
 #define IDC_IP_OCTET2 3027
 #define IDC_IP_OCTET3 3028
 #define IDC_IP_OCTET4 3029
+
+// Graphics page.
+#define IDC_SCREEN_SIZE 1010
+#define IDC_HDR_LEVEL 1011
+#define IDC_FULL_SCREEN 1012
+#define IDC_SHOW_MOVIE 1016
+#define IDC_TRAIL_QUALITY 1018
+
+// Game page.
+#define IDC_PAD_VIBRATION 2010
+#define IDC_SCREEN_SHAKE 2011
+#define IDC_VOICE_PLAYBACK 2012
+#define IDC_BGM_VOLUME 2014
+#define IDC_SE_VOLUME 2015
+#define IDC_VOICE_VOLUME 2016
+#define IDC_RADAR_TYPE 2017
+#define IDC_ARCADE_DIFFICULTY 2018
+#define IDC_GUARD_CORRECTION 2019
+#define IDC_CAMERA_POSITION 2020
+#define IDC_LOCK_ON_TYPE 2021
+#define IDC_CAPTURE_ENABLED 2025
+#define IDC_CAPTURE_SIZE 2026
+
+// Replay page: the lock box of replay n (1 to 30) is IDC_SAVE_REPLAYS + n.
+#define IDC_SAVE_REPLAYS 6001
+
+// Radio-chat page: row k (1 to 12), for F1 to F12, has its message edit at
+// IDC_RADIO_CHAT_TEXT_FIRST and its 全体 box at IDC_RADIO_CHAT_TO_ALL_FIRST,
+// each plus IDC_RADIO_CHAT_ROW_STEP * (k - 1).
+#define IDC_RADIO_CHAT_TEXT_FIRST 5011
+#define IDC_RADIO_CHAT_TO_ALL_FIRST 5012
+#define IDC_RADIO_CHAT_ROW_STEP 10

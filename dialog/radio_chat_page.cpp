@@ -1,0 +1,69 @@
+// The Radio-chat page: the twelve messages of the function keys F1 to F12
+// and whether each goes to everyone.
+#include "app/config_application.h"
+#include "dialog/page_controls.h"
+#include "dialog/page_values.h"
+#include "resources/resource.h"
+
+#include <cstring>
+#include <string>
+
+namespace
+{
+constexpr int TextId(int row)
+{
+    return IDC_RADIO_CHAT_TEXT_FIRST + IDC_RADIO_CHAT_ROW_STEP * row;
+}
+
+constexpr int ToAllId(int row)
+{
+    return IDC_RADIO_CHAT_TO_ALL_FIRST + IDC_RADIO_CHAT_ROW_STEP * row;
+}
+
+// Takes the edit's whole text and keeps what the field holds of it. The
+// bytes after the terminator keep whatever they held.
+void KeepMessage(HWND edit, config::RadioChatEntry* entry)
+{
+    const int capacity = GetWindowTextLengthA(edit) + 1;
+    std::string text(static_cast<std::size_t>(capacity), '\0');
+    const int length = GetWindowTextA(edit, text.data(), capacity);
+    const std::size_t kept =
+        dialog::KeptRadioChatLength(text.data(), static_cast<std::size_t>(length));
+    std::memcpy(entry->text, text.data(), kept);
+    entry->text[kept] = '\0';
+}
+} // namespace
+
+bool CConfigApplication::InitRadioChatPage()
+{
+    const HWND page = pages_[kRadioChatPageIndex].window;
+    config::ConfigRadioChat* radioChat = record_->RadioChat();
+    for (int row = 0; row < config::kRadioChatCount; ++row)
+    {
+        const config::RadioChatEntry& entry = radioChat->entries[row];
+        // A file may fill the field to its last byte with no terminator.
+        const std::string text(entry.text, strnlen(entry.text, sizeof entry.text));
+        // The edit reports the new text at once (EN_UPDATE): the record then
+        // holds only what it can keep of it.
+        SetDlgItemTextA(page, TextId(row), text.c_str());
+        dialog::ShowCheck(page, ToAllId(row), entry.notToAll == 0);
+    }
+    return true;
+}
+
+LRESULT CConfigApplication::OnRadioChatPage(HWND page, UINT message, WPARAM wParam, LPARAM)
+{
+    if (message != WM_COMMAND)
+        return FALSE;
+    const int id = LOWORD(wParam);
+    const int code = HIWORD(wParam);
+    for (int row = 0; row < config::kRadioChatCount; ++row)
+    {
+        config::RadioChatEntry* entry = &record_->RadioChat()->entries[row];
+        if (id == ToAllId(row) && code == BN_CLICKED)
+            entry->notToAll = dialog::IsChecked(page, id) ? 0 : 1;
+        else if (id == TextId(row) && code == EN_UPDATE)
+            KeepMessage(GetDlgItem(page, id), entry);
+    }
+    return TRUE;
+}
