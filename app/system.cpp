@@ -49,6 +49,16 @@ bool CSystem::CreateDialogWindow(HINSTANCE instance, LPCSTR dialogTemplate, int 
     return true;
 }
 
+void CSystem::GrowWindow(int dx, int dy)
+{
+    width_ += dx;
+    height_ += dy;
+    const int width = static_cast<int>(width_);
+    const int height = static_cast<int>(height_);
+    MoveWindow(window_, (GetSystemMetrics(SM_CXSCREEN) - width) / 2,
+               (GetSystemMetrics(SM_CYSCREEN) - height) / 2, width, height, TRUE);
+}
+
 void CSystem::SetName(const char* name)
 {
     std::free(name_);

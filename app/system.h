@@ -22,6 +22,9 @@ public:
     bool CreateDialogWindow(HINSTANCE instance, LPCSTR dialogTemplate, int x, int y, UINT icon,
                             DLGPROC procedure, HWND parent);
     void SetName(const char* name);
+    // Makes the window larger by the given amounts and centres it again on
+    // the screen, as it was placed when created.
+    void GrowWindow(int dx, int dy);
     HWND GetHwnd() const { return window_; }
     HINSTANCE GetInstance() const { return instance_; }
     bool GetModuleDir(char* buffer, std::uint32_t size) const;

@@ -4,7 +4,9 @@
 #include "app/system.h"
 #include "resources/resource.h"
 
+#include <algorithm>
 #include <commctrl.h>
+#include <initializer_list>
 
 namespace
 {
@@ -54,6 +56,41 @@ void MoveOnto(HWND page, const RECT& area)
     MoveWindow(page, area.left, area.top, area.right - area.left, area.bottom - area.top, FALSE);
 }
 
+SIZE WindowSize(HWND window)
+{
+    RECT rect = {};
+    GetWindowRect(window, &rect);
+    return {rect.right - rect.left, rect.bottom - rect.top};
+}
+
+// How much wider and taller `area` must be to hold the largest window.
+SIZE Shortfall(const RECT& area, std::initializer_list<SIZE> sizes)
+{
+    SIZE shortfall = {0, 0};
+    for (const SIZE& size : sizes)
+    {
+        shortfall.cx = std::max(shortfall.cx, size.cx - (area.right - area.left));
+        shortfall.cy = std::max(shortfall.cy, size.cy - (area.bottom - area.top));
+    }
+    return shortfall;
+}
+
+void Grow(HWND window, SIZE by)
+{
+    const SIZE size = WindowSize(window);
+    SetWindowPos(window, nullptr, 0, 0, size.cx + by.cx, size.cy + by.cy,
+                 SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE);
+}
+
+void Shift(HWND control, SIZE by)
+{
+    RECT rect = {};
+    GetWindowRect(control, &rect);
+    MapWindowPoints(nullptr, GetParent(control), reinterpret_cast<POINT*>(&rect), 2);
+    SetWindowPos(control, nullptr, rect.left + by.cx, rect.top + by.cy, 0, 0,
+                 SWP_NOSIZE | SWP_NOZORDER | SWP_NOACTIVATE);
+}
+
 bool IsSelectionChange(LPARAM lParam, HWND tab)
 {
     const auto* header = reinterpret_cast<const NMHDR*>(lParam);
@@ -70,16 +107,13 @@ void CConfigApplication::CreatePages(HINSTANCE instance)
     mainTab_ = GetDlgItem(mainDialog, IDC_MAIN_TAB);
     for (int index = 0; index < kPageCount; ++index)
         InsertTabItem(mainTab_, index, kPages[index].caption);
-    const RECT pageArea = DisplayArea(mainTab_);
+    RECT pageArea = DisplayArea(mainTab_);
     for (int index = 0; index < kPageCount; ++index)
     {
         pages_[index].templateId = kPages[index].templateId;
         pages_[index].window = CreateDialogParamA(
             instance, MAKEINTRESOURCEA(kPages[index].templateId), mainTab_, dialogProcedure, 0);
     }
-    for (const PageSlot& page : pages_)
-        MoveOnto(page.window, pageArea);
-    SelectPage(0);
 
     const HWND keyConfigPage = pages_[kKeyConfigPageIndex].window;
     keyTab_ = GetDlgItem(keyConfigPage, IDC_KEY_TAB);
@@ -90,6 +124,34 @@ void CConfigApplication::CreatePages(HINSTANCE instance)
             CreateDialogParamA(instance, MAKEINTRESOURCEA(kKeyPages[index].templateId),
                                keyConfigPage, dialogProcedure, 0);
     }
+
+    // The pages are laid out in a larger font than the main dialog, so at
+    // their template sizes their lower rows would lie below the tabs' display
+    // areas, out of reach. Where a page does not fit, its tab grows by the
+    // difference, and the dialog and its buttons with it; nothing else moves.
+    const SIZE keyShortfall = Shortfall(
+        DisplayArea(keyTab_), {WindowSize(keyPages_[0].window), WindowSize(keyPages_[1].window)});
+    Grow(keyTab_, keyShortfall);
+    SIZE keyConfigSize = WindowSize(keyConfigPage);
+    keyConfigSize.cx += keyShortfall.cx;
+    keyConfigSize.cy += keyShortfall.cy;
+    const SIZE shortfall = Shortfall(
+        pageArea, {WindowSize(pages_[0].window), WindowSize(pages_[1].window),
+                   WindowSize(pages_[2].window), WindowSize(pages_[3].window),
+                   WindowSize(pages_[4].window), keyConfigSize, WindowSize(pages_[6].window)});
+    if (shortfall.cx > 0 || shortfall.cy > 0)
+    {
+        Grow(mainTab_, shortfall);
+        Shift(GetDlgItem(mainDialog, IDOK), shortfall);
+        Shift(GetDlgItem(mainDialog, IDCANCEL), shortfall);
+        system_->GrowWindow(shortfall.cx, shortfall.cy);
+        pageArea = DisplayArea(mainTab_);
+    }
+
+    for (const PageSlot& page : pages_)
+        MoveOnto(page.window, pageArea);
+    SelectPage(0);
+
     for (int index = 0; index < kKeyPageCount; ++index)
         InsertTabItem(keyTab_, index, kKeyPages[index].caption);
     // The sub-pages are children of the page, not of its tab control.

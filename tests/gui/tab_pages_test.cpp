@@ -70,3 +70,36 @@ TEST(MainDialog, SaveWritesTheRecordAsItStandsAndAsksToClose)
     EXPECT_EQ(gui::ReadFile(tool.SettingsFile())[8], 8);
     EXPECT_TRUE(IsWindow(tool.MainDialog()));
 }
+
+namespace
+{
+// Every visible control of `page` must lie inside the visible part of `clip`.
+void ExpectControlsInside(HWND page, HWND clip, const char* name)
+{
+    RECT visible;
+    GetClientRect(clip, &visible);
+    MapWindowPoints(clip, nullptr, reinterpret_cast<POINT*>(&visible), 2);
+    for (HWND control = GetWindow(page, GW_CHILD); control != nullptr;
+         control = GetWindow(control, GW_HWNDNEXT))
+    {
+        if ((GetWindowLongPtrA(control, GWL_STYLE) & WS_VISIBLE) == 0)
+            continue;
+        RECT rect;
+        GetWindowRect(control, &rect);
+        EXPECT_TRUE(rect.left >= visible.left && rect.right <= visible.right &&
+                    rect.top >= visible.top && rect.bottom <= visible.bottom)
+            << name << ": control " << GetDlgCtrlID(control) << " lies outside the tab";
+    }
+}
+} // namespace
+
+TEST(TabPages, EveryControlOfEveryPageCanBeReached)
+{
+    RunningTool tool;
+    const char* names[kPageCount] = {"graphics", "game",       "network",   "replay",
+                                     "music",    "key config", "radio chat"};
+    for (int index = 0; index < kPageCount; ++index)
+        ExpectControlsInside(tool.Page(index), tool.App().MainTab(), names[index]);
+    ExpectControlsInside(tool.KeyPage(0), tool.App().KeyTab(), "keyboard");
+    ExpectControlsInside(tool.KeyPage(1), tool.App().KeyTab(), "controller");
+}
