@@ -80,11 +80,21 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
     timerRaised_ = true;
 
     CreatePages(instance);
+    InitKeyConfigPage();
     return true;
 }
 
 bool CConfigApplication::Update()
 {
+    input_->Update();
+    // Keys and buttons are taken only while their page is in view.
+    if (currentPage_ != nullptr && currentPage_ == pages_[kKeyConfigPageIndex].window)
+    {
+        if (currentKeyPage_ == keyPages_[kKeyboardPageIndex].window)
+            CaptureKey();
+        else
+            CapturePadButton();
+    }
     return true;
 }
 
