@@ -1,6 +1,6 @@
-// A key assigned as a user assigns it: VEKConfig.exe started on its own,
-// the key-config tab and an action's edit clicked with the real mouse, a
-// real key pressed, the file saved. Only real X events reach DirectInput, so
+// Keys and buttons assigned as a user assigns them: VEKConfig.exe started on
+// its own, the key-config tab and an action's edit clicked with the real
+// mouse, a real key pressed, the file saved. Only real X events reach DirectInput, so
 // the clicks and the key come from xdotool on the Linux side.
 #include "config/save_config.h"
 #include "resources/resource.h"
@@ -114,56 +114,129 @@ HWND FocusOf(HWND window)
     return info.hwndFocus;
 }
 
+// Clicks a tab near its left end (the right end may lie under the scroll
+// arrows) and waits until `shown` is visible.
+testing::AssertionResult ClickTab(HWND tab, int index, HWND shown)
+{
+    const RECT item = TabItemOnScreen(tab, index);
+    if (item.left >= item.right)
+        return testing::AssertionFailure() << "no rectangle for tab " << index;
+    const LONG x = item.left + std::min<LONG>(12, (item.right - item.left) / 2);
+    if (!ClickAt({x, (item.top + item.bottom) / 2}))
+        return testing::AssertionFailure() << "xdotool cannot be started";
+    if (!WaitFor([&] { return IsWindowVisible(shown) != FALSE; }))
+        return testing::AssertionFailure() << "tab " << index << " did not show its page";
+    return testing::AssertionSuccess();
+}
+
+testing::AssertionResult ClickEdit(HWND dialog, HWND edit)
+{
+    if (!ClickAt(CentreOf(edit)))
+        return testing::AssertionFailure() << "xdotool cannot be started";
+    if (!WaitFor([&] { return FocusOf(dialog) == edit; }))
+        return testing::AssertionFailure() << "the edit did not take the focus";
+    return testing::AssertionSuccess();
+}
+
+// Held long enough for the tool's polls to see it go down, then let go.
+testing::AssertionResult PressKey(const std::string& key, HWND edit, const std::string& shows)
+{
+    if (!Xdotool("keydown " + key + " sleep 0.5 keyup " + key))
+        return testing::AssertionFailure() << "xdotool cannot be started";
+    if (!WaitFor([&] { return WindowText(edit) == shows; }))
+        return testing::AssertionFailure() << "the edit shows " << WindowText(edit);
+    return testing::AssertionSuccess();
+}
+
+// The tool on its key-config page, opened with the mouse.
+class KeyConfigPage : public testing::Test
+{
+protected:
+    void SetUp() override
+    {
+        dialog_ = tool_.WaitForMainDialog();
+        ASSERT_NE(dialog_, nullptr);
+        // The dialog shows before its pages exist; the player list is filled last.
+        ASSERT_TRUE(
+            WaitFor([&] { return SendMessageA(Control(IDC_PAD_PLAYER), CB_GETCOUNT, 0, 0) == 4; }));
+        const HWND keyTab = Control(IDC_KEY_TAB);
+        ASSERT_TRUE(ClickTab(GetDlgItem(dialog_, IDC_MAIN_TAB), kKeyConfigTab, keyTab));
+    }
+
+    HWND Control(int id) { return FindControl(dialog_, id); }
+
+    // Saves with 保存, closes with Yes and answers the file the tool wrote.
+    std::vector<std::uint8_t> SaveAndClose()
+    {
+        tool_.PostCommand(dialog_, IDOK);
+        EXPECT_EQ(tool_.AnswerMessageBox(IDYES).text,
+                  "保存されました\nコンフィグツールを閉じますか？");
+        DWORD exitCode = 1;
+        EXPECT_TRUE(tool_.WaitForExit(exitCode));
+        EXPECT_EQ(exitCode, 0u);
+        return e2e::ReadFileBytes(folder_.SettingsFile());
+    }
+
+    static std::vector<std::uint8_t> Defaults(void (*change)(config::ConfigKeys& keys))
+    {
+        config::CSaveConfig record;
+        record.ResetAll();
+        change(*record.Keys());
+        return record.SaveToBytes();
+    }
+
+    static constexpr int kKeyConfigTab = 5;
+    e2e::SaveFolder folder_;
+    ToolProcess tool_{folder_};
+    HWND dialog_ = nullptr;
+};
+
 } // namespace
 
-TEST(KeyCapture, PressingXOnActionFourteenTakesXFromActionSixteenAndSavesBoth)
+TEST_F(KeyConfigPage, PressingXOnActionFourteenTakesXFromActionSixteenAndSavesBoth)
 {
-    e2e::SaveFolder folder;
-    ToolProcess tool(folder);
-    const HWND dialog = tool.WaitForMainDialog();
-    ASSERT_NE(dialog, nullptr);
-
-    const HWND mainTab = GetDlgItem(dialog, IDC_MAIN_TAB);
-    const RECT keyConfigTab = TabItemOnScreen(mainTab, 5);
-    ASSERT_LT(keyConfigTab.left, keyConfigTab.right) << "no rectangle for the tab";
-    // Near the left end: the tab may be cut off on the right by the scroll arrows.
-    const LONG x =
-        keyConfigTab.left + std::min<LONG>(12, (keyConfigTab.right - keyConfigTab.left) / 2);
-    ASSERT_TRUE(ClickAt({x, (keyConfigTab.top + keyConfigTab.bottom) / 2})) << "xdotool missing";
-
-    const HWND slide = FindControl(dialog, IDC_KEYBOARD_EDIT_FIRST + 14);
-    const HWND guard = FindControl(dialog, IDC_KEYBOARD_EDIT_FIRST + 15);
-    const HWND shoot = FindControl(dialog, IDC_KEYBOARD_EDIT_FIRST + 16);
-    ASSERT_NE(slide, nullptr);
-    ASSERT_TRUE(WaitFor([&] { return IsWindowVisible(slide) != FALSE; }))
-        << "the key-config page did not come up";
+    const HWND slide = Control(IDC_KEYBOARD_EDIT_FIRST + 14);
+    const HWND shoot = Control(IDC_KEYBOARD_EDIT_FIRST + 16);
     EXPECT_EQ(WindowText(slide), "Z");
     EXPECT_EQ(WindowText(shoot), "X");
 
-    ASSERT_TRUE(ClickAt(CentreOf(slide)));
-    ASSERT_TRUE(WaitFor([&] { return FocusOf(dialog) == slide; }));
-    // Held long enough for the tool's polls to see it go down, then let go.
-    ASSERT_TRUE(Xdotool("keydown x sleep 0.5 keyup x"));
-    ASSERT_TRUE(WaitFor([&] { return WindowText(slide) == "X"; }));
+    ASSERT_TRUE(ClickEdit(dialog_, slide));
+    ASSERT_TRUE(PressKey("x", slide, "X"));
     EXPECT_EQ(WindowText(shoot), "Z");
-    EXPECT_TRUE(WaitFor([&] { return FocusOf(dialog) == guard; }, 2000))
+    EXPECT_TRUE(
+        WaitFor([&] { return FocusOf(dialog_) == Control(IDC_KEYBOARD_EDIT_FIRST + 15); }, 2000))
         << "the focus moves on to action 15";
 
-    tool.PostCommand(dialog, IDOK);
-    const e2e::MessageBoxSeen saved = tool.AnswerMessageBox(IDYES);
-    EXPECT_EQ(saved.text, "保存されました\nコンフィグツールを閉じますか？");
-    DWORD exitCode = 1;
-    ASSERT_TRUE(tool.WaitForExit(exitCode));
-    EXPECT_EQ(exitCode, 0u);
+    const std::vector<std::uint8_t> file = SaveAndClose();
+    config::CSaveConfig saved;
+    ASSERT_TRUE(saved.LoadFromBytes(file.data(), file.size()));
+    EXPECT_EQ(saved.Keys()->keyboardKeys[14], 0x2Du);
+    EXPECT_EQ(saved.Keys()->keyboardKeys[16], 0x2Cu);
+    EXPECT_EQ(file, Defaults(
+                        [](config::ConfigKeys& keys)
+                        {
+                            keys.keyboardKeys[14] = 0x2D;
+                            keys.keyboardKeys[16] = 0x2C;
+                        }))
+        << "nothing else changed";
+}
 
-    const std::vector<std::uint8_t> file = e2e::ReadFileBytes(folder.SettingsFile());
-    config::CSaveConfig savedRecord;
-    ASSERT_TRUE(savedRecord.LoadFromBytes(file.data(), file.size()));
-    EXPECT_EQ(savedRecord.Keys()->keyboardKeys[14], 0x2Du);
-    EXPECT_EQ(savedRecord.Keys()->keyboardKeys[16], 0x2Cu);
-    config::CSaveConfig expected;
-    expected.ResetAll();
-    expected.Keys()->keyboardKeys[14] = 0x2D;
-    expected.Keys()->keyboardKeys[16] = 0x2C;
-    EXPECT_EQ(file, expected.SaveToBytes()) << "nothing else changed";
+TEST_F(KeyConfigPage, OnTheControllerPageTheKeyOfAnActionStandsInForItsButton)
+{
+    const HWND shoot = Control(IDC_PAD_EDIT_FIRST + 16);
+    const HWND slide = Control(IDC_PAD_EDIT_FIRST + 14);
+    ASSERT_TRUE(ClickTab(Control(IDC_KEY_TAB), 1, shoot));
+    ASSERT_TRUE(ClickEdit(dialog_, shoot));
+    // Z is slot 0's key for action 14: its button comes over to action 16.
+    ASSERT_TRUE(PressKey("z", shoot, "BUTTON1"));
+    EXPECT_EQ(WindowText(slide), "BUTTON3");
+    EXPECT_TRUE(
+        WaitFor([&] { return FocusOf(dialog_) == Control(IDC_PAD_EDIT_FIRST + 17); }, 2000));
+
+    EXPECT_EQ(SaveAndClose(), Defaults(
+                                  [](config::ConfigKeys& keys)
+                                  {
+                                      keys.padConfigs[0].buttons[14] = 16;
+                                      keys.padConfigs[0].buttons[16] = 14;
+                                  }));
 }
