@@ -83,6 +83,7 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
     InitGraphicsPage();
     InitGamePage();
     InitNetworkPage();
+    InitKeyConfigPage();
     InitReplayPage();
     InitRadioChatPage();
     return true;
@@ -90,6 +91,15 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
 
 bool CConfigApplication::Update()
 {
+    input_->Update();
+    // Keys and buttons are taken only while their page is in view.
+    if (currentPage_ != nullptr && currentPage_ == pages_[kKeyConfigPageIndex].window)
+    {
+        if (currentKeyPage_ == keyPages_[kKeyboardPageIndex].window)
+            CaptureKey();
+        else
+            CapturePadButton();
+    }
     return true;
 }
 

@@ -27,6 +27,8 @@ inline constexpr int kGraphicsPageIndex = 0;
 inline constexpr int kGamePageIndex = 1;
 inline constexpr int kReplayPageIndex = 3;
 inline constexpr int kRadioChatPageIndex = 6;
+inline constexpr int kKeyboardPageIndex = 0;
+inline constexpr int kPadPageIndex = 1;
 
 class CConfigApplication : public CApplicationMain
 {
@@ -42,12 +44,15 @@ public:
 
     config::CSaveConfig* Record() { return record_; }
     CSystem* System() { return system_; }
+    input::CInput* Input() { return input_; }
     HWND MainTab() const { return mainTab_; }
     HWND KeyTab() const { return keyTab_; }
     HWND PageWindow(int index) const { return pages_[index].window; }
     HWND KeyPageWindow(int index) const { return keyPages_[index].window; }
     HWND CurrentPage() const { return currentPage_; }
     HWND CurrentKeyPage() const { return currentKeyPage_; }
+    std::int8_t FocusedAction() const { return focusedAction_; }
+    std::uint32_t SelectedPlayer() const { return selectedPlayer_; }
 
     // Shows one page of the main tab (or of the key tab) and hides the
     // others; an index out of range hides them all.
@@ -80,6 +85,17 @@ public:
                                               LPARAM lParam);
     LRESULT OnIpEntryDialog(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam);
     bool ReadIpEntry(HWND dialog);
+
+    // Key-config page: a keyboard key and, per player, a controller button
+    // for each action, assigned by pressing it while the action's edit has
+    // the focus.
+    bool InitKeyConfigPage();
+    void FillKeyboardPage();
+    void FillPadPage();
+    LRESULT OnKeyboardPage(HWND page, UINT message, WPARAM wParam, LPARAM lParam);
+    LRESULT OnPadPage(HWND page, UINT message, WPARAM wParam, LPARAM lParam);
+    void CaptureKey();
+    void CapturePadButton();
 
 private:
     // Creates the two tab controls' items and pages and places the pages on

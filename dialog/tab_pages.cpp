@@ -30,8 +30,8 @@ const PageEntry kPages[kPageCount] = {
 };
 
 const PageEntry kKeyPages[kKeyPageCount] = {
-    {"キーボード", IDD_KEYBOARD_PAGE, nullptr},
-    {"コントローラー", IDD_PAD_PAGE, nullptr},
+    {"キーボード", IDD_KEYBOARD_PAGE, &CConfigApplication::OnKeyboardPage},
+    {"コントローラー", IDD_PAD_PAGE, &CConfigApplication::OnPadPage},
 };
 
 void InsertTabItem(HWND tab, int index, const char* caption)

@@ -75,3 +75,19 @@
 #define IDC_RADIO_CHAT_TEXT_FIRST 5011
 #define IDC_RADIO_CHAT_TO_ALL_FIRST 5012
 #define IDC_RADIO_CHAT_ROW_STEP 10
+
+// Keyboard sub-page: action i (0 to 23) has its edit at
+// IDC_KEYBOARD_EDIT_FIRST + i and its label at IDC_KEYBOARD_LABEL_FIRST + i.
+#define IDC_KEYBOARD_EDIT_FIRST 4110
+#define IDC_KEYBOARD_LABEL_FIRST 4134
+#define IDC_KEYBOARD_RESET 4190
+
+// Controller sub-page: the same per action, from IDC_PAD_EDIT_FIRST and
+// IDC_PAD_LABEL_FIRST.
+#define IDC_PAD_EDIT_FIRST 4210
+#define IDC_PAD_LABEL_FIRST 4234
+#define IDC_PAD_DEVICE_LABEL 4261
+#define IDC_PAD_DEVICE 4262
+#define IDC_PAD_RESET 4290
+#define IDC_PAD_PLAYER 4291
+#define IDC_PAD_PLAYER_LABEL 4292
