@@ -91,6 +91,18 @@ void Shift(HWND control, SIZE by)
                  SWP_NOSIZE | SWP_NOZORDER | SWP_NOACTIVATE);
 }
 
+// Shows the page at `index` and makes it `current`; hides every other one.
+// Out of range, all are hidden and `current` stays.
+template <std::size_t Count> void ShowOnly(const PageSlot (&pages)[Count], int index, HWND& current)
+{
+    for (int position = 0; position < static_cast<int>(Count); ++position)
+    {
+        ShowWindow(pages[position].window, position == index ? SW_SHOW : SW_HIDE);
+        if (position == index)
+            current = pages[position].window;
+    }
+}
+
 bool IsSelectionChange(LPARAM lParam, HWND tab)
 {
     const auto* header = reinterpret_cast<const NMHDR*>(lParam);
@@ -164,35 +176,13 @@ void CConfigApplication::CreatePages(HINSTANCE instance)
 
 bool CConfigApplication::SelectPage(int index)
 {
-    for (int position = 0; position < kPageCount; ++position)
-    {
-        if (position == index)
-        {
-            ShowWindow(pages_[position].window, SW_SHOW);
-            currentPage_ = pages_[position].window;
-        }
-        else
-        {
-            ShowWindow(pages_[position].window, SW_HIDE);
-        }
-    }
+    ShowOnly(pages_, index, currentPage_);
     return true;
 }
 
 bool CConfigApplication::SelectKeyPage(int index)
 {
-    for (int position = 0; position < kKeyPageCount; ++position)
-    {
-        if (position == index)
-        {
-            ShowWindow(keyPages_[position].window, SW_SHOW);
-            currentKeyPage_ = keyPages_[position].window;
-        }
-        else
-        {
-            ShowWindow(keyPages_[position].window, SW_HIDE);
-        }
-    }
+    ShowOnly(keyPages_, index, currentKeyPage_);
     return true;
 }
 
