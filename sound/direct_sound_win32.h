@@ -1,0 +1,42 @@
+#pragma once
+
+// The DirectSound side of the sound device, for the Windows tests.
+#include "sound/sound_device.h"
+
+#include <windows.h>
+
+#include <dsound.h>
+
+namespace sound
+{
+
+// The platform functions CSound::Init calls.
+struct DeviceApi
+{
+    HRESULT(WINAPI* createDevice)(LPCGUID, LPDIRECTSOUND8*, LPUNKNOWN);
+    int(WINAPI* messageBox)(HWND, LPCSTR, LPCSTR, UINT);
+};
+
+// DirectSoundCreate8 and MessageBoxA.
+const DeviceApi& SystemDeviceApi();
+
+struct CSound::Platform
+{
+    IDirectSound8* device;
+    IDirectSoundBuffer* primary;
+    IDirectSound3DListener* listener;
+    CRITICAL_SECTION lock;
+    bool lockCreated;
+};
+
+namespace device
+{
+
+// Locks the whole buffer, copies `bytes` of `pcm` in and unlocks it. A lock
+// that reports DSERR_BUFFERLOST restores the buffer and locks once more;
+// false when the lock still fails.
+bool FillStaticBuffer(IDirectSoundBuffer8* buffer, const void* pcm, DWORD bytes);
+
+} // namespace device
+
+} // namespace sound
