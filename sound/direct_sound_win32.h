@@ -5,7 +5,12 @@
 
 #include <windows.h>
 
+#include <mmsystem.h>
+
 #include <dsound.h>
+
+// <windows.h> would rename the class-name operation of every class.
+#undef GetClassName
 
 namespace sound
 {

@@ -40,6 +40,8 @@ public:
     CSound& operator=(const CSound&) = delete;
     // Deletes the lock, then releases the listener, the primary buffer and
     // the device, each only when held; stops being the current device.
+    // Destroy every sound buffer before the device: DirectSound releases a
+    // device's buffers with it.
     virtual ~CSound();
     virtual const char* GetClassName() const;
 

@@ -197,7 +197,8 @@ DeviceBuffer* Duplicate(DeviceBuffer* master)
     if (sound == nullptr)
         return nullptr;
     IDirectSoundBuffer* duplicate = nullptr;
-    if (FAILED(sound->GetPlatform()->device->DuplicateSoundBuffer(Native(master), &duplicate)))
+    if (FAILED(sound->GetPlatform()->device->DuplicateSoundBuffer(
+            reinterpret_cast<IDirectSoundBuffer*>(Native(master)), &duplicate)))
         return nullptr;
     return reinterpret_cast<DeviceBuffer*>(
         Requery<IDirectSoundBuffer8>(duplicate, IID_IDirectSoundBuffer8));

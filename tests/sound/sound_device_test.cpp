@@ -39,21 +39,6 @@ TEST(SoundDevice, InitMakesTheDeviceCurrentUntilItIsDestroyed)
     EXPECT_EQ(CurrentSound(), nullptr);
 }
 
-TEST(SoundDevice, ABufferOutlivesTheDeviceItWasMadeWith)
-{
-    testing_support::TempFolder folder;
-    testing_support::WaveSpec spec;
-    spec.dataBytes = 4000;
-    const std::string path = folder.File("outlive.wav");
-    testing_support::WriteBytes(path, testing_support::MakeWave(spec));
-    auto* device = new testing_support::ScopedSoundDevice();
-    ASSERT_TRUE(device->Ready());
-    sound::CSoundBuffer buffer;
-    ASSERT_TRUE(buffer.Open(path.c_str(), 2, sound::kCapsStatic));
-    delete device;
-    EXPECT_TRUE(buffer.Release());
-}
-
 #ifndef _WIN32
 TEST(SoundDevice, OnPosixBuffersNeedNoDevice)
 {
