@@ -3,11 +3,13 @@
 // The DirectSound side of the sound device, for the Windows tests.
 #include "sound/sound_device.h"
 
+// In this order: <dsound.h> needs the wave formats of <mmsystem.h>, which
+// the lean <windows.h> leaves out.
+// clang-format off
 #include <windows.h>
-
 #include <mmsystem.h>
-
 #include <dsound.h>
+// clang-format on
 
 // <windows.h> would rename the class-name operation of every class.
 #undef GetClassName

@@ -50,7 +50,10 @@ int SeekCallback(void* source, ogg_int64_t offset, int whence)
     return 0;
 }
 
-long TellCallback(void* source) { return static_cast<MemoryFile*>(source)->position; }
+long TellCallback(void* source)
+{
+    return static_cast<MemoryFile*>(source)->position;
+}
 
 int CloseCallback(void* source)
 {
@@ -162,7 +165,8 @@ bool DecodeOggVorbis(MemoryFile* file, DecodedAudio* out)
     int section = 0;
     while (written < bytes)
     {
-        const int wanted = static_cast<int>(std::min<std::uint32_t>(kReadChunkBytes, bytes - written));
+        const int wanted =
+            static_cast<int>(std::min<std::uint32_t>(kReadChunkBytes, bytes - written));
         const long got = ov_read(&vorbis, reinterpret_cast<char*>(pcm + written), wanted,
                                  /*bigendianp=*/0, /*word=*/2, /*sgned=*/1, &section);
         if (got == 0)

@@ -12,13 +12,25 @@ CResourceBase::CResourceBase(const CResourceBase& other) : type_(other.type_)
         std::memcpy(name_, other.name_, other.nameSize_);
 }
 
-CResourceBase::~CResourceBase() { FreeName(); }
+CResourceBase::~CResourceBase()
+{
+    FreeName();
+}
 
-bool CResourceBase::Load(const char* path) { return LoadFromFile(path); }
+bool CResourceBase::Load(const char* path)
+{
+    return LoadFromFile(path);
+}
 
-bool CResourceBase::LoadFromFile(const char*) { return false; }
+bool CResourceBase::LoadFromFile(const char*)
+{
+    return false;
+}
 
-bool CResourceBase::LoadFromMemory(const void*, std::uint32_t) { return false; }
+bool CResourceBase::LoadFromMemory(const void*, std::uint32_t)
+{
+    return false;
+}
 
 bool CResourceBase::Reload()
 {
@@ -29,11 +41,20 @@ bool CResourceBase::Reload()
     return LoadFromFile(saved.name_);
 }
 
-bool CResourceBase::Unload() { return Release(); }
+bool CResourceBase::Unload()
+{
+    return Release();
+}
 
-bool CResourceBase::IsLoaded() const { return false; }
+bool CResourceBase::IsLoaded() const
+{
+    return false;
+}
 
-std::uint32_t CResourceBase::GetResourceSize() const { return 0; }
+std::uint32_t CResourceBase::GetResourceSize() const
+{
+    return 0;
+}
 
 void CResourceBase::CopyClassName(char* buffer, std::uint32_t size) const
 {
@@ -45,20 +66,35 @@ void CResourceBase::CopyClassName(char* buffer, std::uint32_t size) const
     buffer[length] = '\0';
 }
 
-const char* CResourceBase::GetClassName() const { return "CResourceBase"; }
+const char* CResourceBase::GetClassName() const
+{
+    return "CResourceBase";
+}
 
-std::uint32_t CResourceBase::GetClassSize() const { return sizeof(CResourceBase); }
+std::uint32_t CResourceBase::GetClassSize() const
+{
+    return sizeof(CResourceBase);
+}
 
-CResourceBase* CResourceBase::CreateAt(void* memory) const { return new (memory) CResourceBase(); }
+CResourceBase* CResourceBase::CreateAt(void* memory) const
+{
+    return new (memory) CResourceBase();
+}
 
-CResourceBase* CResourceBase::Create() const { return new (std::nothrow) CResourceBase(); }
+CResourceBase* CResourceBase::Create() const
+{
+    return new (std::nothrow) CResourceBase();
+}
 
 CResourceBase* CResourceBase::CloneAt(void* memory) const
 {
     return new (memory) CResourceBase(*this);
 }
 
-CResourceBase* CResourceBase::Clone() const { return new (std::nothrow) CResourceBase(*this); }
+CResourceBase* CResourceBase::Clone() const
+{
+    return new (std::nothrow) CResourceBase(*this);
+}
 
 bool CResourceBase::Release()
 {
@@ -91,11 +127,20 @@ bool CResourceBase::ReserveName(std::uint32_t size)
     return true;
 }
 
-const char* CResourceBase::GetName() const { return name_ != nullptr ? name_ : ""; }
+const char* CResourceBase::GetName() const
+{
+    return name_ != nullptr ? name_ : "";
+}
 
-std::uint32_t CResourceBase::GetNameSize() const { return nameSize_; }
+std::uint32_t CResourceBase::GetNameSize() const
+{
+    return nameSize_;
+}
 
-std::uint32_t CResourceBase::GetType() const { return type_; }
+std::uint32_t CResourceBase::GetType() const
+{
+    return type_;
+}
 
 void CResourceBase::FreeName()
 {

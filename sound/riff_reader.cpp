@@ -45,9 +45,8 @@ bool FindChunk(ByteSource& source, std::uint64_t begin, std::uint64_t end, const
         if (std::memcmp(header, id, 4) == 0)
         {
             char type[4];
-            if (form == nullptr ||
-                (chunk.size >= 4 && source.ReadAt(chunk.dataOffset, type, 4) &&
-                 std::memcmp(type, form, 4) == 0))
+            if (form == nullptr || (chunk.size >= 4 && source.ReadAt(chunk.dataOffset, type, 4) &&
+                                    std::memcmp(type, form, 4) == 0))
             {
                 *found = chunk;
                 return true;
@@ -121,8 +120,8 @@ bool ReadWave(ByteSource& source, DecodedAudio* out)
     if (!ReadWaveLayout(source, &layout))
         return false;
     out->format = layout.format;
-    const bool fits = layout.dataOffset <= source.Size() &&
-                      layout.dataBytes <= source.Size() - layout.dataOffset;
+    const bool fits =
+        layout.dataOffset <= source.Size() && layout.dataBytes <= source.Size() - layout.dataOffset;
     if (!fits || layout.dataBytes > kMaxBufferBytes || !IsOpenableFormat(*layout.format))
     {
         out->Reset();

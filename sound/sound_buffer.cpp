@@ -40,21 +40,45 @@ CSoundBuffer::CSoundBuffer(const CSoundBuffer& other) : CResourceBase(other)
     SetInstanceCount(other.instanceCount_);
 }
 
-CSoundBuffer::~CSoundBuffer() { Release(); }
+CSoundBuffer::~CSoundBuffer()
+{
+    Release();
+}
 
-bool CSoundBuffer::LoadFromFile(const char* path) { return Open(path, 1, kCapsStatic); }
+bool CSoundBuffer::LoadFromFile(const char* path)
+{
+    return Open(path, 1, kCapsStatic);
+}
 
-bool CSoundBuffer::IsLoaded() const { return master_ != nullptr; }
+bool CSoundBuffer::IsLoaded() const
+{
+    return master_ != nullptr;
+}
 
-std::uint32_t CSoundBuffer::GetResourceSize() const { return info_.dataBytes; }
+std::uint32_t CSoundBuffer::GetResourceSize() const
+{
+    return info_.dataBytes;
+}
 
-const char* CSoundBuffer::GetClassName() const { return "CSoundBuffer"; }
+const char* CSoundBuffer::GetClassName() const
+{
+    return "CSoundBuffer";
+}
 
-std::uint32_t CSoundBuffer::GetClassSize() const { return sizeof(CSoundBuffer); }
+std::uint32_t CSoundBuffer::GetClassSize() const
+{
+    return sizeof(CSoundBuffer);
+}
 
-CSoundBuffer* CSoundBuffer::CreateAt(void* memory) const { return new (memory) CSoundBuffer(); }
+CSoundBuffer* CSoundBuffer::CreateAt(void* memory) const
+{
+    return new (memory) CSoundBuffer();
+}
 
-CSoundBuffer* CSoundBuffer::Create() const { return new (std::nothrow) CSoundBuffer(); }
+CSoundBuffer* CSoundBuffer::Create() const
+{
+    return new (std::nothrow) CSoundBuffer();
+}
 
 CSoundBuffer* CSoundBuffer::CloneAt(void* memory) const
 {
@@ -142,7 +166,8 @@ bool CSoundBuffer::Open(const char* path, std::uint32_t instanceCount, std::uint
 
 bool CSoundBuffer::SetInstanceCount(std::uint32_t count)
 {
-    auto* instances = static_cast<PlayInstance*>(base::AllocateZeroed(count * sizeof(PlayInstance)));
+    auto* instances =
+        static_cast<PlayInstance*>(base::AllocateZeroed(count * sizeof(PlayInstance)));
     if (instances == nullptr)
         return false;
     for (std::uint32_t i = count; i < instanceCount_; ++i)

@@ -12,14 +12,14 @@ namespace sound
 // The length and format of a buffer, shared with its play instances.
 struct BufferInfo
 {
-    float length;               // seconds
-    std::uint32_t dataBytes;    // decoded PCM bytes
+    float length;            // seconds
+    std::uint32_t dataBytes; // decoded PCM bytes
     std::uint16_t channels;
     std::uint16_t bytesPerSample; // bits per sample / 8
     std::uint32_t sampleRate;
     SourceKind sourceKind;
-    std::uint32_t capsFlags;    // as passed to Open
-    WaveFormat* format;         // shared among clones
+    std::uint32_t capsFlags; // as passed to Open
+    WaveFormat* format;      // shared among clones
 };
 
 // One prepared playback voice: a duplicate of the master buffer. The tool
@@ -27,11 +27,11 @@ struct BufferInfo
 struct PlayInstance
 {
     DeviceBuffer* buffer;
-    Device3DBuffer* buffer3D;   // only with kCapsCtrl3D
-    DeviceNotify* notify;       // only with kCapsCtrlPositionNotify
+    Device3DBuffer* buffer3D; // only with kCapsCtrl3D
+    DeviceNotify* notify;     // only with kCapsCtrlPositionNotify
     const BufferInfo* owner;
-    float playbackScale;        // 1.0
-    float playbackLimit;        // 1.0e9
+    float playbackScale; // 1.0
+    float playbackLimit; // 1.0e9
 };
 
 // One audio file decoded into a static sound buffer of the current device.

@@ -1,9 +1,8 @@
 // The POSIX stand-in for DirectSound: no audio output, the same operations.
 // A buffer keeps its PCM in memory; duplicates share it. Buffers need no
 // device, so that decoding works without a window.
-#include "sound/sound_device.h"
-
 #include "base/memory.h"
+#include "sound/sound_device.h"
 
 #include <cstring>
 #include <mutex>
@@ -55,9 +54,15 @@ CSound::~CSound()
         currentSound = nullptr;
 }
 
-const char* CSound::GetClassName() const { return "CSound"; }
+const char* CSound::GetClassName() const
+{
+    return "CSound";
+}
 
-bool CSound::Init(void* windowHandle) { return InitWith(windowHandle, DeviceApi{}); }
+bool CSound::Init(void* windowHandle)
+{
+    return InitWith(windowHandle, DeviceApi{});
+}
 
 bool CSound::InitWith(void* windowHandle, const DeviceApi&)
 {
@@ -74,7 +79,10 @@ bool CSound::InitWith(void* windowHandle, const DeviceApi&)
     return true;
 }
 
-CSound* CurrentSound() { return currentSound; }
+CSound* CurrentSound()
+{
+    return currentSound;
+}
 
 namespace device
 {
@@ -108,9 +116,15 @@ DeviceBuffer* Duplicate(DeviceBuffer* master)
     return duplicate;
 }
 
-Device3DBuffer* Query3DBuffer(DeviceBuffer*) { return nullptr; }
+Device3DBuffer* Query3DBuffer(DeviceBuffer*)
+{
+    return nullptr;
+}
 
-DeviceNotify* QueryNotify(DeviceBuffer*) { return nullptr; }
+DeviceNotify* QueryNotify(DeviceBuffer*)
+{
+    return nullptr;
+}
 
 void StopAndRewind(DeviceBuffer* buffer)
 {

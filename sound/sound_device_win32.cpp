@@ -69,9 +69,15 @@ CSound::~CSound()
         currentSound = nullptr;
 }
 
-const char* CSound::GetClassName() const { return "CSound"; }
+const char* CSound::GetClassName() const
+{
+    return "CSound";
+}
 
-bool CSound::Init(void* windowHandle) { return InitWith(windowHandle, SystemDeviceApi()); }
+bool CSound::Init(void* windowHandle)
+{
+    return InitWith(windowHandle, SystemDeviceApi());
+}
 
 bool CSound::InitWith(void* windowHandle, const DeviceApi& api)
 {
@@ -83,7 +89,8 @@ bool CSound::InitWith(void* windowHandle, const DeviceApi& api)
     if (platform_ == nullptr || platform_->device != nullptr)
         return false;
     Platform& p = *platform_;
-    const auto fail = [&api](const char* message) {
+    const auto fail = [&api](const char* message)
+    {
         api.messageBox(nullptr, message, "Error", MB_OK);
         return false;
     };
@@ -130,7 +137,10 @@ bool CSound::InitWith(void* windowHandle, const DeviceApi& api)
     return true;
 }
 
-CSound* CurrentSound() { return currentSound; }
+CSound* CurrentSound()
+{
+    return currentSound;
+}
 
 namespace device
 {
@@ -142,8 +152,7 @@ bool FillStaticBuffer(IDirectSoundBuffer8* buffer, const void* pcm, DWORD bytes)
     DWORD firstBytes = 0;
     DWORD secondBytes = 0;
     const auto lock = [&] {
-        return buffer->Lock(0, 0, &first, &firstBytes, &second, &secondBytes,
-                            DSBLOCK_ENTIREBUFFER);
+        return buffer->Lock(0, 0, &first, &firstBytes, &second, &secondBytes, DSBLOCK_ENTIREBUFFER);
     };
     HRESULT result = lock();
     if (result == DSERR_BUFFERLOST)
@@ -245,11 +254,20 @@ bool ReadBack(DeviceBuffer* buffer, std::uint8_t* destination, std::uint32_t siz
     return true;
 }
 
-void Release(DeviceBuffer* buffer) { Native(buffer)->Release(); }
+void Release(DeviceBuffer* buffer)
+{
+    Native(buffer)->Release();
+}
 
-void Release(Device3DBuffer* buffer) { reinterpret_cast<IUnknown*>(buffer)->Release(); }
+void Release(Device3DBuffer* buffer)
+{
+    reinterpret_cast<IUnknown*>(buffer)->Release();
+}
 
-void Release(DeviceNotify* notify) { reinterpret_cast<IUnknown*>(notify)->Release(); }
+void Release(DeviceNotify* notify)
+{
+    reinterpret_cast<IUnknown*>(notify)->Release();
+}
 
 } // namespace device
 

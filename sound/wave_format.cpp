@@ -13,7 +13,10 @@ WaveFormat* AllocateFormat(std::uint16_t extraSize)
     return format;
 }
 
-std::size_t FormatBytes(const WaveFormat& format) { return sizeof(WaveFormat) + format.extraSize; }
+std::size_t FormatBytes(const WaveFormat& format)
+{
+    return sizeof(WaveFormat) + format.extraSize;
+}
 
 const std::uint8_t* ExtraFormatBytes(const WaveFormat& format)
 {

@@ -20,7 +20,10 @@ CKeyFrameList::CKeyFrameList(const CKeyFrameList& other) : name_(other.name_)
     count_ = other.count_;
 }
 
-CKeyFrameList::~CKeyFrameList() { Release(); }
+CKeyFrameList::~CKeyFrameList()
+{
+    Release();
+}
 
 bool CKeyFrameList::Release()
 {
@@ -30,20 +33,35 @@ bool CKeyFrameList::Release()
     return true;
 }
 
-const char* CKeyFrameList::GetClassName() const { return "CKeyFrameList"; }
+const char* CKeyFrameList::GetClassName() const
+{
+    return "CKeyFrameList";
+}
 
-std::uint32_t CKeyFrameList::GetClassSize() const { return sizeof(CKeyFrameList); }
+std::uint32_t CKeyFrameList::GetClassSize() const
+{
+    return sizeof(CKeyFrameList);
+}
 
-CKeyFrameList* CKeyFrameList::CreateAt(void* memory) const { return new (memory) CKeyFrameList(); }
+CKeyFrameList* CKeyFrameList::CreateAt(void* memory) const
+{
+    return new (memory) CKeyFrameList();
+}
 
-CKeyFrameList* CKeyFrameList::Create() const { return new (std::nothrow) CKeyFrameList(); }
+CKeyFrameList* CKeyFrameList::Create() const
+{
+    return new (std::nothrow) CKeyFrameList();
+}
 
 CKeyFrameList* CKeyFrameList::CloneAt(void* memory) const
 {
     return new (memory) CKeyFrameList(*this);
 }
 
-CKeyFrameList* CKeyFrameList::Clone() const { return new (std::nothrow) CKeyFrameList(*this); }
+CKeyFrameList* CKeyFrameList::Clone() const
+{
+    return new (std::nothrow) CKeyFrameList(*this);
+}
 
 bool CKeyFrameList::KeyAdd(std::int32_t value, float time, float ease)
 {

@@ -48,9 +48,15 @@ constexpr const char* kLevelKeys[kLevelCount][5] = {
     {"クライマックステンション", "クライマックス", "CLIMAX", "CLIMAXTENSION", "CT"},
 };
 
-bool IsBlank(Byte c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\v'; }
+bool IsBlank(Byte c)
+{
+    return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\v';
+}
 
-bool IsLead(Byte c) { return base::IsLeadByte(c); }
+bool IsLead(Byte c)
+{
+    return base::IsLeadByte(c);
+}
 
 bool MatchesAny(const char* key, const char* const (&keys)[5])
 {
@@ -82,7 +88,10 @@ void Record(CTextString* log, const char* message)
     Record(log, message);
 }
 
-float LengthOf(sound::CSoundBuffer* sound) { return sound != nullptr ? sound->GetLength() : 0.0f; }
+float LengthOf(sound::CSoundBuffer* sound)
+{
+    return sound != nullptr ? sound->GetLength() : 0.0f;
+}
 
 // The size of the character at `text[position]`: 2 for a lead byte and its
 // trail, 1 otherwise, 0 at the end of the text (the zero itself, or a lead
@@ -196,7 +205,10 @@ CTensionFile::CTensionFile(const CTensionFile& other)
         timeline_ = other.timeline_->Clone();
 }
 
-CTensionFile::~CTensionFile() { ReleaseTimeline(); }
+CTensionFile::~CTensionFile()
+{
+    ReleaseTimeline();
+}
 
 bool CTensionFile::LoadFromArchive(sound::CSoundBuffer* sound, const char* entryName,
                                    const CqvxPackFile* archive, CTextString* log)
@@ -292,8 +304,8 @@ bool CTensionFile::Parse(sound::CSoundBuffer* sound, const char* text, char sepa
     return Finish(IsCorrect(sound, log), finaleCount, log);
 }
 
-bool CTensionFile::ParseForLength(float length, const char* text, char separator,
-                                  char terminator, CTextString* log)
+bool CTensionFile::ParseForLength(float length, const char* text, char separator, char terminator,
+                                  CTextString* log)
 {
     int finaleCount = 0;
     if (!Scan(length, text, separator, terminator, log, &finaleCount))
@@ -413,15 +425,19 @@ bool CTensionFile::Finish(bool checked, int finaleCount, CTextString* log)
     if (checked && finaleCount <= 1)
         return true;
     if (finaleCount >= 2)
-        Record(log, "クライマックスフィナーレ エラー[クライマックスフィナーレが複数指定されています]");
+        Record(log,
+               "クライマックスフィナーレ エラー[クライマックスフィナーレが複数指定されています]");
     Record(log, "Time Data IsCorrect Error!!");
     return false;
 }
 
-bool CTensionFile::IsFileNameKey(const char* key) { return MatchesAny(key, kFileNameKeys); }
+bool CTensionFile::IsFileNameKey(const char* key)
+{
+    return MatchesAny(key, kFileNameKeys);
+}
 
-bool CTensionFile::ReadValue(const char* text, char terminator, std::size_t* position,
-                             char* value, bool* cut)
+bool CTensionFile::ReadValue(const char* text, char terminator, std::size_t* position, char* value,
+                             bool* cut)
 {
     const auto* bytes = reinterpret_cast<const Byte*>(text);
     const std::size_t start = *position;
@@ -459,7 +475,10 @@ bool CTensionFile::ReadFileName(const char* text, char terminator, std::size_t* 
     return true;
 }
 
-bool CTensionFile::IsCommentKey(const char* key) { return MatchesAny(key, kCommentKeys); }
+bool CTensionFile::IsCommentKey(const char* key)
+{
+    return MatchesAny(key, kCommentKeys);
+}
 
 bool CTensionFile::ReadComment(const char* text, char terminator, std::size_t* position)
 {
@@ -490,7 +509,10 @@ int CTensionFile::GetTensionIndex(const char* key)
     return kNoLevel;
 }
 
-bool CTensionFile::IsFinaleKey(const char* key) { return MatchesAny(key, kFinaleKeys); }
+bool CTensionFile::IsFinaleKey(const char* key)
+{
+    return MatchesAny(key, kFinaleKeys);
+}
 
 bool CTensionFile::ReleaseTimeline()
 {
@@ -517,16 +539,16 @@ bool CTensionFile::CheckLength(float length, CTextString* log)
     // Written so that a length that is not a number fails too.
     if (!(length >= kMinimumLength))
     {
-        RecordFormatted(log,
-                        "ファイル時間 エラー[%f秒のファイルです : %d秒以上の長さのファイルが必要です]",
-                        static_cast<double>(length), kMinimumLengthSeconds);
+        RecordFormatted(
+            log, "ファイル時間 エラー[%f秒のファイルです : %d秒以上の長さのファイルが必要です]",
+            static_cast<double>(length), kMinimumLengthSeconds);
         return false;
     }
     if (length > kMaximumLength)
     {
-        RecordFormatted(log,
-                        "ファイル時間 エラー[%f秒のファイルです : %d秒以下の長さのファイルが必要です]",
-                        static_cast<double>(length), kMaximumLengthSeconds);
+        RecordFormatted(
+            log, "ファイル時間 エラー[%f秒のファイルです : %d秒以下の長さのファイルが必要です]",
+            static_cast<double>(length), kMaximumLengthSeconds);
         return false;
     }
     return true;
@@ -569,8 +591,7 @@ bool CTensionFile::CheckComment(sound::CSoundBuffer*, CTextString* log)
             lineBytes += size;
             if (lineBytes > kCommentLineLimit)
             {
-                RecordFormatted(log,
-                                "ファイルコメント エラー[1行の文字数を %d 以内にしてください]",
+                RecordFormatted(log, "ファイルコメント エラー[1行の文字数を %d 以内にしてください]",
                                 static_cast<int>(kCommentLineLimit));
                 return false;
             }
@@ -600,7 +621,8 @@ bool CTensionFile::CheckTimelineFor(float length, CTextString* log)
     }
     // The integer part of the limit; lengths beyond 480 s never reach here
     // from IsCorrect, the clamp only keeps a direct call defined.
-    const auto limit = [length](double factor) {
+    const auto limit = [length](double factor)
+    {
         const double product = std::trunc(length * factor);
         return product < 1.0e9 ? static_cast<int>(product) : 1000000000;
     };

@@ -92,8 +92,8 @@ public:
 private:
     // Steps 1 to 4 of Parse: false when the text is null, the timeline
     // cannot be made or a "/*" comment is not closed; else the finale count.
-    bool Scan(float length, const char* text, char separator, char terminator,
-              CTextString* log, int* finaleCount);
+    bool Scan(float length, const char* text, char separator, char terminator, CTextString* log,
+              int* finaleCount);
     // Step 5 of Parse, given the result of the checks.
     static bool Finish(bool checked, int finaleCount, CTextString* log);
     static bool CheckLength(float length, CTextString* log);

@@ -5,9 +5,15 @@
 namespace tension
 {
 
-CTextString::CTextString(const char* text) { Assign(text); }
+CTextString::CTextString(const char* text)
+{
+    Assign(text);
+}
 
-CTextString::CTextString(const CTextString& other) { Assign(other.CStr(), other.Length()); }
+CTextString::CTextString(const CTextString& other)
+{
+    Assign(other.CStr(), other.Length());
+}
 
 CTextString& CTextString::operator=(const CTextString& other)
 {
@@ -16,7 +22,10 @@ CTextString& CTextString::operator=(const CTextString& other)
     return *this;
 }
 
-CTextString::~CTextString() { base::FreeBlock(data_); }
+CTextString::~CTextString()
+{
+    base::FreeBlock(data_);
+}
 
 bool CTextString::Assign(const char* text)
 {

@@ -4,7 +4,6 @@
 #include "tests/support/sound_device_fixture.h"
 
 #include <gtest/gtest.h>
-
 #include <string>
 #include <vector>
 
@@ -42,8 +41,9 @@ public:
     STDMETHOD(GetFrequency)(LPDWORD) override { return E_NOTIMPL; }
     STDMETHOD(GetStatus)(LPDWORD) override { return E_NOTIMPL; }
     STDMETHOD(Initialize)(LPDIRECTSOUND, LPCDSBUFFERDESC) override { return E_NOTIMPL; }
-    STDMETHOD(Lock)(DWORD, DWORD, LPVOID* first, LPDWORD firstBytes, LPVOID* second,
-                    LPDWORD secondBytes, DWORD) override
+    STDMETHOD(Lock)
+    (DWORD, DWORD, LPVOID* first, LPDWORD firstBytes, LPVOID* second, LPDWORD secondBytes,
+     DWORD) override
     {
         ++locks;
         if (lostLocks > 0)
@@ -89,8 +89,8 @@ public:
     STDMETHOD(QueryInterface)(REFIID, void**) override { return E_NOINTERFACE; }
     STDMETHOD_(ULONG, AddRef)() override { return 1; }
     STDMETHOD_(ULONG, Release)() override { return ++releases, 1; }
-    STDMETHOD(CreateSoundBuffer)(LPCDSBUFFERDESC description, LPLPDIRECTSOUNDBUFFER buffer,
-                                 IUnknown*) override
+    STDMETHOD(CreateSoundBuffer)
+    (LPCDSBUFFERDESC description, LPLPDIRECTSOUNDBUFFER buffer, IUnknown*) override
     {
         primaryFlags = description->dwFlags;
         if (FAILED(createBufferResult))

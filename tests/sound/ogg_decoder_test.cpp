@@ -2,10 +2,9 @@
 #include "sound/ogg_decoder.h"
 #include "tests/support/audio_fixtures.h"
 
-#include <gtest/gtest.h>
-
 #include <algorithm>
 #include <cstring>
+#include <gtest/gtest.h>
 
 #define OV_EXCLUDE_STATIC_CALLBACKS
 #include <vorbis/vorbisfile.h>
@@ -38,19 +37,20 @@ Reference DecodeDirectly(const Bytes& stream)
 {
     Cursor cursor{&stream, 0};
     ov_callbacks callbacks{};
-    callbacks.read_func = [](void* out, std::size_t size, std::size_t count, void* source) {
+    callbacks.read_func = [](void* out, std::size_t size, std::size_t count, void* source)
+    {
         auto* c = static_cast<Cursor*>(source);
         const std::size_t bytes = std::min(size * count, c->bytes->size() - c->position);
         std::memcpy(out, c->bytes->data() + c->position, bytes);
         c->position += bytes;
         return bytes / size;
     };
-    callbacks.seek_func = [](void* source, ogg_int64_t offset, int whence) {
+    callbacks.seek_func = [](void* source, ogg_int64_t offset, int whence)
+    {
         auto* c = static_cast<Cursor*>(source);
-        const ogg_int64_t origin = whence == SEEK_SET ? 0
-                                   : whence == SEEK_CUR
-                                       ? ogg_int64_t(c->position)
-                                       : ogg_int64_t(c->bytes->size());
+        const ogg_int64_t origin = whence == SEEK_SET   ? 0
+                                   : whence == SEEK_CUR ? ogg_int64_t(c->position)
+                                                        : ogg_int64_t(c->bytes->size());
         c->position = std::size_t(std::clamp<ogg_int64_t>(origin + offset, 0, c->bytes->size()));
         return 0;
     };

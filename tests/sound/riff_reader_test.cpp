@@ -2,9 +2,8 @@
 #include "sound/riff_reader.h"
 #include "tests/support/audio_fixtures.h"
 
-#include <gtest/gtest.h>
-
 #include <cstring>
+#include <gtest/gtest.h>
 #include <string>
 
 using sound::DecodedAudio;
@@ -26,7 +25,10 @@ WaveSpec Pcm(std::uint32_t dataBytes)
     return spec;
 }
 
-Bytes Body(std::size_t size) { return PatternBytes(size); }
+Bytes Body(std::size_t size)
+{
+    return PatternBytes(size);
+}
 
 } // namespace
 
@@ -140,14 +142,24 @@ TEST(RiffReader, RefusesBrokenFiles)
     const Case cases[] = {
         {"an empty file", {}},
         {"a file that is no RIFF file", notRiff},
-        {"a RIFF form other than WAVE", RiffWriter().Chunk("fmt ", FormatChunkBody(pcm)).Chunk("data", Body(4)).Finish("AVI ")},
+        {"a RIFF form other than WAVE",
+         RiffWriter().Chunk("fmt ", FormatChunkBody(pcm)).Chunk("data", Body(4)).Finish("AVI ")},
         {"no fmt chunk", RiffWriter().Chunk("data", Body(100)).Finish()},
-        {"a fmt chunk of 14 bytes", RiffWriter().Chunk("fmt ", shortFormat).Chunk("data", Body(100)).Finish()},
+        {"a fmt chunk of 14 bytes",
+         RiffWriter().Chunk("fmt ", shortFormat).Chunk("data", Body(100)).Finish()},
         {"no data chunk", RiffWriter().Chunk("fmt ", FormatChunkBody(pcm)).Finish()},
-        {"a data chunk only before fmt", RiffWriter().Chunk("data", Body(100)).Chunk("fmt ", FormatChunkBody(pcm)).Finish()},
-        {"a truncated data chunk", RiffWriter().Chunk("fmt ", FormatChunkBody(pcm)).ChunkClaiming("data", 2000, Body(1000)).Finish()},
-        {"a data chunk claiming 4 GiB", RiffWriter().Chunk("fmt ", FormatChunkBody(pcm)).ChunkClaiming("data", 0xFFFFFFF0u, Body(100)).Finish()},
-        {"extra format bytes beyond the fmt chunk", RiffWriter().Chunk("fmt ", extraBeyondChunk).Chunk("data", Body(100)).Finish()},
+        {"a data chunk only before fmt",
+         RiffWriter().Chunk("data", Body(100)).Chunk("fmt ", FormatChunkBody(pcm)).Finish()},
+        {"a truncated data chunk", RiffWriter()
+                                       .Chunk("fmt ", FormatChunkBody(pcm))
+                                       .ChunkClaiming("data", 2000, Body(1000))
+                                       .Finish()},
+        {"a data chunk claiming 4 GiB", RiffWriter()
+                                            .Chunk("fmt ", FormatChunkBody(pcm))
+                                            .ChunkClaiming("data", 0xFFFFFFF0u, Body(100))
+                                            .Finish()},
+        {"extra format bytes beyond the fmt chunk",
+         RiffWriter().Chunk("fmt ", extraBeyondChunk).Chunk("data", Body(100)).Finish()},
         {"a file cut inside the fmt chunk", wholeFileCut},
     };
     for (const Case& c : cases)
@@ -170,12 +182,9 @@ TEST(RiffReader, RefusesFormatsTheLengthCannotBeComputedFor)
         bool opens;
     };
     const Case cases[] = {
-        {"no channels", 0, 44100, 16, false},
-        {"no sample rate", 2, 0, 16, false},
-        {"4 bits per sample", 1, 8000, 4, false},
-        {"7 bits per sample", 1, 8000, 7, false},
-        {"8 bits per sample", 1, 8000, 8, true},
-        {"12 bits per sample", 1, 8000, 12, true},
+        {"no channels", 0, 44100, 16, false},     {"no sample rate", 2, 0, 16, false},
+        {"4 bits per sample", 1, 8000, 4, false}, {"7 bits per sample", 1, 8000, 7, false},
+        {"8 bits per sample", 1, 8000, 8, true},  {"12 bits per sample", 1, 8000, 12, true},
     };
     for (const Case& c : cases)
     {

@@ -8,7 +8,6 @@
 #include "tests/support/temp_folder.h"
 
 #include <gtest/gtest.h>
-
 #include <string>
 
 using sound::CSoundBuffer;
@@ -136,7 +135,8 @@ TEST_F(SoundBufferTest, TheExtensionDecidesHowTheFileIsRead)
 
 TEST_F(SoundBufferTest, BrokenWaveFilesDoNotOpen)
 {
-    const WaveSpec pcm = [] {
+    const WaveSpec pcm = []
+    {
         WaveSpec spec;
         spec.dataBytes = 4000;
         return spec;
@@ -149,9 +149,17 @@ TEST_F(SoundBufferTest, BrokenWaveFilesDoNotOpen)
         Bytes file;
     };
     const Case cases[] = {
-        {"a short fmt chunk", testing_support::RiffWriter().Chunk("fmt ", shortFormat).Chunk("data", PatternBytes(4000)).Finish()},
-        {"no data chunk", testing_support::RiffWriter().Chunk("fmt ", testing_support::FormatChunkBody(pcm)).Finish()},
-        {"a truncated data chunk", testing_support::RiffWriter().Chunk("fmt ", testing_support::FormatChunkBody(pcm)).ChunkClaiming("data", 8000, PatternBytes(4000)).Finish()},
+        {"a short fmt chunk", testing_support::RiffWriter()
+                                  .Chunk("fmt ", shortFormat)
+                                  .Chunk("data", PatternBytes(4000))
+                                  .Finish()},
+        {"no data chunk", testing_support::RiffWriter()
+                              .Chunk("fmt ", testing_support::FormatChunkBody(pcm))
+                              .Finish()},
+        {"a truncated data chunk", testing_support::RiffWriter()
+                                       .Chunk("fmt ", testing_support::FormatChunkBody(pcm))
+                                       .ChunkClaiming("data", 8000, PatternBytes(4000))
+                                       .Finish()},
         {"no RIFF at all", PatternBytes(4000)},
     };
     for (const Case& c : cases)
@@ -186,7 +194,8 @@ TEST_F(SoundBufferTest, ANonPcmWaveKeepsItsExtraFormatBytes)
     // WAVE_FORMAT_EXTENSIBLE, which DirectSound accepts: 22 extra bytes.
     WaveSpec spec;
     spec.formatTag = 0xFFFE;
-    spec.extra = {16, 0, 3, 0, 0, 0, 1, 0, 0, 0, 0, 0, 0x10, 0, 0x80, 0, 0, 0xAA, 0, 0x38, 0x9B, 0x71};
+    spec.extra = {16, 0,    3, 0,    0, 0, 1,    0, 0,    0,    0,
+                  0,  0x10, 0, 0x80, 0, 0, 0xAA, 0, 0x38, 0x9B, 0x71};
     spec.dataBytes = 4000;
     CSoundBuffer buffer;
     ASSERT_TRUE(buffer.Open(Write("extensible.wav", MakeWave(spec)).c_str(), 1, kCapsStatic));
@@ -318,7 +327,8 @@ TEST_F(SoundBufferTest, AnyAllocationFailureFailsCleanly)
 {
     OggSpec spec;
     spec.samplesPerChannel = 4410;
-    const std::string paths[] = {WriteWave("alloc.wav", 4000), Write("alloc.ogg", EncodeOggVorbis(spec))};
+    const std::string paths[] = {WriteWave("alloc.wav", 4000),
+                                 Write("alloc.ogg", EncodeOggVorbis(spec))};
     for (const std::string& path : paths)
     {
         bool opened = false;

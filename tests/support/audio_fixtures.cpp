@@ -3,7 +3,6 @@
 #include <cmath>
 #include <cstring>
 #include <stdexcept>
-
 #include <vorbis/vorbisenc.h>
 
 namespace testing_support
@@ -23,7 +22,11 @@ void PutU32(Bytes& out, std::uint32_t value)
     PutU16(out, value >> 16);
 }
 
-void PutId(Bytes& out, const char* id) { out.insert(out.end(), id, id + 4); }
+void PutId(Bytes& out, const char* id)
+{
+    for (int i = 0; i < 4; ++i)
+        out.push_back(static_cast<std::uint8_t>(id[i]));
+}
 
 void Append(Bytes& out, const ogg_page& page)
 {
@@ -104,7 +107,8 @@ Bytes MakeWaveOfLength(double seconds)
 
 SampleSource TuneSource(long sampleRate)
 {
-    return [sampleRate](float** channels, int channelCount, int count, std::uint64_t first) {
+    return [sampleRate](float** channels, int channelCount, int count, std::uint64_t first)
+    {
         constexpr double kTwoPi = 6.283185307179586;
         for (int i = 0; i < count; ++i)
         {
@@ -121,7 +125,10 @@ SampleSource TuneSource(long sampleRate)
     };
 }
 
-Bytes EncodeOggVorbis(const OggSpec& spec) { return EncodeOggVorbis(spec, TuneSource(spec.sampleRate)); }
+Bytes EncodeOggVorbis(const OggSpec& spec)
+{
+    return EncodeOggVorbis(spec, TuneSource(spec.sampleRate));
+}
 
 Bytes EncodeOggVorbis(const OggSpec& spec, const SampleSource& source)
 {

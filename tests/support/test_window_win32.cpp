@@ -7,9 +7,9 @@ namespace testing_support
 
 void* TestWindowHandle()
 {
-    static const HWND window = CreateWindowExA(0, "STATIC", "vek-sound-test", WS_OVERLAPPED, 0, 0,
-                                               16, 16, nullptr, nullptr,
-                                               GetModuleHandleA(nullptr), nullptr);
+    static const HWND window =
+        CreateWindowExA(0, "STATIC", "vek-sound-test", WS_OVERLAPPED, 0, 0, 16, 16, nullptr,
+                        nullptr, GetModuleHandleA(nullptr), nullptr);
     return window;
 }
 

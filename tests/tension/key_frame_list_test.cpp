@@ -3,7 +3,6 @@
 #include "tension/key_frame_list.h"
 
 #include <gtest/gtest.h>
-
 #include <memory>
 
 using tension::CKeyFrameList;

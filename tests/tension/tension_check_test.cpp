@@ -3,7 +3,6 @@
 #include "tests/tension/tension_support.h"
 
 #include <gtest/gtest.h>
-
 #include <string>
 
 using tension::CTensionFile;
@@ -17,7 +16,10 @@ namespace
 
 constexpr const char* kIsCorrectError = "Time Data IsCorrect Error!!";
 
-std::string Named(const std::string& entries) { return "NAME:x;\n" + entries; }
+std::string Named(const std::string& entries)
+{
+    return "NAME:x;\n" + entries;
+}
 
 } // namespace
 
@@ -33,10 +35,12 @@ TEST(TensionCheck, TheMusicMustLastFromSixtyToFourHundredEightySeconds)
         {60.0, true, ""},
         {480.0, true, ""},
         {59.5, false,
-         Lines({"ファイル時間 エラー[59.500000秒のファイルです : 60秒以上の長さのファイルが必要です]",
-                kIsCorrectError})},
+         Lines(
+             {"ファイル時間 エラー[59.500000秒のファイルです : 60秒以上の長さのファイルが必要です]",
+              kIsCorrectError})},
         {480.5, false,
-         Lines({"ファイル時間 エラー[480.500000秒のファイルです : 480秒以下の長さのファイルが必要です]",
+         Lines({"ファイル時間 エラー[480.500000秒のファイルです : "
+                "480秒以下の長さのファイルが必要です]",
                 kIsCorrectError})},
     };
     for (const Case& c : cases)
@@ -63,7 +67,7 @@ TEST(TensionCheck, TheNameHasOneToFortyBytes)
         {std::string(40, 'n'), true},
         {std::string(41, 'n'), false},
         {"二十文字の名前二十文字の名前二十文字の名前ああ", false}, // 46 bytes
-        {"二十文字の名前二十文字の名前二十文字の名", true},      // 40 bytes
+        {"二十文字の名前二十文字の名前二十文字の名", true},        // 40 bytes
     };
     for (const Case& c : cases)
     {
@@ -98,8 +102,8 @@ TEST(TensionCheck, TheCommentHasAtMostFourLinesOfFortyBytesAndHundredSixtyInAll)
         {"20 double-byte characters", twentyKanji, nullptr},
         {"21 double-byte characters", twentyKanji + "一",
          "ファイルコメント エラー[1行の文字数を 40 以内にしてください]"},
-        {"160 bytes in four lines", line40 + "\n" + line40 + "\n" + line40 + "\n" + std::string(37, 'c'),
-         nullptr},
+        {"160 bytes in four lines",
+         line40 + "\n" + line40 + "\n" + line40 + "\n" + std::string(37, 'c'), nullptr},
         {"161 bytes fail before the line checks", std::string(161, 'c'),
          "ファイルコメント エラー[文字数を 160 以内にしてください]"},
     };
@@ -148,7 +152,8 @@ TEST(TensionCheck, EachLevelHasAMaximumNumberOfSegments)
 {
     // `count` entries of a level one second apart from second 10 on, then
     // one entry of the closing level: `count` segments of the level.
-    const auto repeat = [](const char* level, int count, const char* closing) {
+    const auto repeat = [](const char* level, int count, const char* closing)
+    {
         std::string entries;
         for (int i = 0; i < count; ++i)
             entries += std::string(level) + ":" + std::to_string(10 + i) + ";\n";
@@ -174,8 +179,7 @@ TEST(TensionCheck, EachLevelHasAMaximumNumberOfSegments)
                 kIsCorrectError})},
         {"four Low segments", repeat("LOW", 4, "NT"), ""},
         {"five Low segments", repeat("LOW", 5, "NT"),
-         Lines({"LowTension 回数オーバー[現在 5 回です 4 回以内にしてください]",
-                kIsCorrectError})},
+         Lines({"LowTension 回数オーバー[現在 5 回です 4 回以内にしてください]", kIsCorrectError})},
     };
     for (const Case& c : cases)
     {
@@ -189,9 +193,11 @@ TEST(TensionCheck, LowMustLastAtLeastAsLongAsHi)
 {
     const Outcome noLow = Parse(Named("HI:10;\nNT:20;\n"), 200.0);
     EXPECT_FALSE(noLow.accepted);
-    EXPECT_EQ(noLow.log,
-              Lines({"LowTension 時間不足[現在 0.000000 秒です HiTension 時間の 10.000000 秒以上必要です]",
-                     kIsCorrectError}));
+    EXPECT_EQ(
+        noLow.log,
+        Lines(
+            {"LowTension 時間不足[現在 0.000000 秒です HiTension 時間の 10.000000 秒以上必要です]",
+             kIsCorrectError}));
     const Outcome equal = Parse(Named("HI:10;\nNT:20;\nLOW:30;\nNT:40;\n"), 200.0);
     EXPECT_TRUE(equal.accepted) << equal.log;
 }
@@ -200,37 +206,40 @@ TEST(TensionCheck, EveryFailingCheckRecordsItsOwnMessageInOrder)
 {
     std::string entries = "FC:" + std::string(170, 'c') + ";\n";
     for (int i = 0; i < 6; ++i)
-        entries += "HI:" + std::to_string(10 + 20 * i) + ";\nNT:" + std::to_string(20 + 20 * i) +
-                   ";\n";
+        entries +=
+            "HI:" + std::to_string(10 + 20 * i) + ";\nNT:" + std::to_string(20 + 20 * i) + ";\n";
     entries += "CLIMAX:140;\nNT:170;\n";
     const Outcome outcome = Parse(entries, 200.0);
     EXPECT_FALSE(outcome.accepted);
-    EXPECT_EQ(outcome.log,
-              Lines({"ファイル名 エラー[ファイル名を 1 ～ 40 文字以内にしてください]",
-                     "ファイルコメント エラー[文字数を 160 以内にしてください]",
-                     "HiTension 時間オーバー[現在 60.000000 秒です 40 秒以内にしてください]",
-                     "HiTension 回数オーバー[現在 6 回です 4 回以内にしてください]",
-                     "ClimaxTension 時間オーバー[現在 30.000000 秒です 20 秒以内にしてください]",
-                     "LowTension 時間不足[現在 0.000000 秒です HiTension 時間の 60.000000 秒以上必要です]",
-                     kIsCorrectError}));
+    EXPECT_EQ(
+        outcome.log,
+        Lines(
+            {"ファイル名 エラー[ファイル名を 1 ～ 40 文字以内にしてください]",
+             "ファイルコメント エラー[文字数を 160 以内にしてください]",
+             "HiTension 時間オーバー[現在 60.000000 秒です 40 秒以内にしてください]",
+             "HiTension 回数オーバー[現在 6 回です 4 回以内にしてください]",
+             "ClimaxTension 時間オーバー[現在 30.000000 秒です 20 秒以内にしてください]",
+             "LowTension 時間不足[現在 0.000000 秒です HiTension 時間の 60.000000 秒以上必要です]",
+             kIsCorrectError}));
 }
 
 TEST(TensionQuery, TheTensionIsTheLevelOfTheLastKeyAtOrBeforeTheTime)
 {
     CTensionFile file;
     EXPECT_EQ(file.GetTension(10.0f), TensionLevel::Normal) << "before any parse";
-    ASSERT_TRUE(Parse(file, Named("LOW:30;\nHI:60;\nLOW:90;\nCLIMAX:165;\nCF:170;\n"), 180.0)
-                    .accepted);
+    ASSERT_TRUE(
+        Parse(file, Named("LOW:30;\nHI:60;\nLOW:90;\nCLIMAX:165;\nCF:170;\n"), 180.0).accepted);
     struct Case
     {
         float time;
         TensionLevel level;
     };
     const Case cases[] = {
-        {0.0f, TensionLevel::Normal},    {29.9f, TensionLevel::Normal}, {30.0f, TensionLevel::Low},
-        {60.0f, TensionLevel::Hi},       {89.0f, TensionLevel::Hi},     {90.0f, TensionLevel::Low},
-        {165.0f, TensionLevel::Climax},  {179.9f, TensionLevel::Climax},
-        {180.0f, TensionLevel::Normal},  {-1.0f, TensionLevel::Normal},
+        {0.0f, TensionLevel::Normal},       {29.9f, TensionLevel::Normal},
+        {30.0f, TensionLevel::Low},         {60.0f, TensionLevel::Hi},
+        {89.0f, TensionLevel::Hi},          {90.0f, TensionLevel::Low},
+        {165.0f, TensionLevel::Climax},     {179.9f, TensionLevel::Climax},
+        {180.0f, TensionLevel::Normal},     {-1.0f, TensionLevel::Normal},
         {180.0f + 61.0f, TensionLevel::Hi}, // folded from the loop start 0: 61 s
     };
     for (const Case& c : cases)
@@ -244,8 +253,8 @@ TEST(TensionQuery, TheTensionIsTheLevelOfTheLastKeyAtOrBeforeTheTime)
 TEST(TensionQuery, TheFinalePlaysForAFiftiethOfTheMusicInsideClimax)
 {
     CTensionFile file;
-    ASSERT_TRUE(Parse(file, Named("LOW:30;\nHI:60;\nLOW:90;\nCLIMAX:165;\nCF:170;\n"), 180.0)
-                    .accepted);
+    ASSERT_TRUE(
+        Parse(file, Named("LOW:30;\nHI:60;\nLOW:90;\nCLIMAX:165;\nCF:170;\n"), 180.0).accepted);
     EXPECT_FALSE(file.IsFinale(169.9f));
     EXPECT_TRUE(file.IsFinale(170.0f));
     EXPECT_TRUE(file.IsFinale(173.5f));

@@ -4,9 +4,8 @@
 #include "tests/support/temp_folder.h"
 #include "tests/tension/tension_support.h"
 
-#include <gtest/gtest.h>
-
 #include <filesystem>
+#include <gtest/gtest.h>
 #include <string>
 
 using tension::CqvxPackFile;
@@ -134,9 +133,10 @@ TEST_F(TensionLoadTest, FailuresOfTheParseEndWithTheConversionMessage)
     CTensionFile file;
     const Result twice = Load(file, "twice.txt", 180.0);
     EXPECT_FALSE(twice.loaded);
-    EXPECT_EQ(twice.log,
-              Lines({"クライマックスフィナーレ エラー[クライマックスフィナーレが複数指定されています]",
-                     kIsCorrectError, kConversionError}));
+    EXPECT_EQ(
+        twice.log,
+        Lines({"クライマックスフィナーレ エラー[クライマックスフィナーレが複数指定されています]",
+               kIsCorrectError, kConversionError}));
 
     WriteText("open.txt", "NAME:x;\n/* never closed\n");
     const Result open = Load(file, "open.txt", 180.0);
@@ -145,9 +145,11 @@ TEST_F(TensionLoadTest, FailuresOfTheParseEndWithTheConversionMessage)
 
     WriteText("short.txt", "NAME:x;\n");
     const Result shortMusic = Load(file, "short.txt", 59.0);
-    EXPECT_EQ(shortMusic.log,
-              Lines({"ファイル時間 エラー[59.000000秒のファイルです : 60秒以上の長さのファイルが必要です]",
-                     kIsCorrectError, kConversionError}));
+    EXPECT_EQ(
+        shortMusic.log,
+        Lines(
+            {"ファイル時間 エラー[59.000000秒のファイルです : 60秒以上の長さのファイルが必要です]",
+             kIsCorrectError, kConversionError}));
 }
 
 TEST_F(TensionLoadTest, AnUnrecognisedKeyAloneIsOnlyAWarning)
@@ -253,7 +255,8 @@ TEST(TensionArchive, TheListIsTriedInOrderUntilOneSucceeds)
     const CqvxPackFile* archives[] = {&without, nullptr, &failing, &good, &later};
     CTensionFile file;
     CTextString log;
-    ASSERT_TRUE(file.LoadFromArchiveList(Music(180.0), "song", CqvxPackFileList{archives, 5}, &log));
+    ASSERT_TRUE(
+        file.LoadFromArchiveList(Music(180.0), "song", CqvxPackFileList{archives, 5}, &log));
     EXPECT_STREQ(file.GetName().CStr(), "good");
     EXPECT_NE(std::string(log.CStr()).find("File Buffer Conversion Error!!"), std::string::npos)
         << "the failing archive was tried first";

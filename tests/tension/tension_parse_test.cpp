@@ -3,7 +3,6 @@
 #include "tests/tension/tension_support.h"
 
 #include <gtest/gtest.h>
-
 #include <string>
 #include <vector>
 
@@ -25,10 +24,7 @@ struct Key
 {
     float time;
     TensionLevel level;
-    bool operator==(const Key& other) const
-    {
-        return time == other.time && level == other.level;
-    }
+    bool operator==(const Key& other) const { return time == other.time && level == other.level; }
 };
 
 std::ostream& operator<<(std::ostream& out, const Key& key)
@@ -69,7 +65,8 @@ TEST(TensionParse, TheWorkedExampleIsAccepted)
     const Outcome outcome = Parse(file, kWorkedExample, 180.0);
     EXPECT_TRUE(outcome.accepted);
     EXPECT_EQ(outcome.log, "");
-    EXPECT_EQ(Keys(file), (std::vector<Key>{{0, N}, {30, L}, {60, H}, {90, L}, {165, C}, {180, N}}));
+    EXPECT_EQ(Keys(file),
+              (std::vector<Key>{{0, N}, {30, L}, {60, H}, {90, L}, {165, C}, {180, N}}));
     EXPECT_STREQ(file.GetName().CStr(), "Test");
     EXPECT_EQ(file.GetFinaleTime(), 170.0f);
     EXPECT_EQ(file.GetFinaleWindow(), static_cast<float>(180.0 * double(0.1f) * double(0.2f)));
@@ -143,9 +140,9 @@ TEST(TensionParse, KeysIgnoreTheCaseOfAsciiLettersOnly)
         bool names;
     };
     const Case cases[] = {
-        {"low", true},         {"Low", true},         {"lOw", true},
+        {"low", true},          {"Low", true},           {"lOw", true},
         {"LOW TENSION", false}, {"LOW\tTENSION", false}, {"ＬＯＷ", false},
-        {"ろー", false},        {"LOWT", false},       {"", false},
+        {"ろー", false},        {"LOWT", false},         {"", false},
     };
     for (const Case& c : cases)
     {
@@ -173,8 +170,7 @@ TEST(TensionParse, InsideAValueLineBreaksSeparatorsAndCommentMarksAreText)
     const Outcome outcome =
         Parse(file, "NAME:x;\nCOMMENT: line one\r\nline: 2 // no /* no */;\n", 200.0);
     EXPECT_TRUE(outcome.accepted) << outcome.log;
-    EXPECT_STREQ(file.GetComment().CStr(),
-                 "line one\r\nline: 2 // no /* no */");
+    EXPECT_STREQ(file.GetComment().CStr(), "line one\r\nline: 2 // no /* no */");
 }
 
 TEST(TensionParse, CommentsAreSkippedWhereKeysAreRead)
@@ -195,8 +191,8 @@ TEST(TensionParse, CommentsAreSkippedWhereKeysAreRead)
 
 TEST(TensionParse, AnUnterminatedBlockCommentFailsAtOnceWithoutAMessage)
 {
-    for (const char* text : {"NAME:x;\n/* never closed", "NAME:x;\n/* ends in a lead byte \x81",
-                             "/*", "/*/"})
+    for (const char* text :
+         {"NAME:x;\n/* never closed", "NAME:x;\n/* ends in a lead byte \x81", "/*", "/*/"})
     {
         CTensionFile file;
         const Outcome outcome = Parse(file, text, 200.0);
@@ -262,22 +258,35 @@ TEST(TensionParse, OnlySomeEntriesPassOverTheCharacterAfterTheirTerminator)
         std::string log;
     };
     const Case cases[] = {
-        {"a file name followed directly by a level entry", "NAME:x;LOW:30;\n",
-         {{0, N}, {200, N}}, Lines({kNotTension})},
-        {"a comment followed directly by a level entry", "NAME:x;\nFC:c;LOW:30;\n",
-         {{0, N}, {200, N}}, Lines({kNotTension})},
-        {"a finale followed directly by a level entry", "NAME:x;\nCF:150;LOW:30;\n",
-         {{0, N}, {200, N}}, Lines({kNotTension})},
-        {"the lost character may be a blank", "NAME:x; LOW:30;\n",
-         {{0, N}, {30, L}, {200, N}}, ""},
-        {"an accepted level entry leaves the next one whole", "NAME:x;\nLOW:30;HI:20;\n",
-         {{0, N}, {20, H}, {30, L}, {200, N}}, ""},
-        {"a dropped level entry passes over one character too", "NAME:x;\nLOW:0;HI:20;\n",
-         {{0, N}, {200, N}}, Lines({kOutsideRange, kNotTension})},
-        {"an unrecognised entry leaves the next one whole", "NAME:x;\nFOO:1;HI:20;\nLOW:25;\n",
-         {{0, N}, {20, H}, {25, L}, {200, N}}, Lines({kNotTension})},
+        {"a file name followed directly by a level entry",
+         "NAME:x;LOW:30;\n",
+         {{0, N}, {200, N}},
+         Lines({kNotTension})},
+        {"a comment followed directly by a level entry",
+         "NAME:x;\nFC:c;LOW:30;\n",
+         {{0, N}, {200, N}},
+         Lines({kNotTension})},
+        {"a finale followed directly by a level entry",
+         "NAME:x;\nCF:150;LOW:30;\n",
+         {{0, N}, {200, N}},
+         Lines({kNotTension})},
+        {"the lost character may be a blank", "NAME:x; LOW:30;\n", {{0, N}, {30, L}, {200, N}}, ""},
+        {"an accepted level entry leaves the next one whole",
+         "NAME:x;\nLOW:30;HI:20;\n",
+         {{0, N}, {20, H}, {30, L}, {200, N}},
+         ""},
+        {"a dropped level entry passes over one character too",
+         "NAME:x;\nLOW:0;HI:20;\n",
+         {{0, N}, {200, N}},
+         Lines({kOutsideRange, kNotTension})},
+        {"an unrecognised entry leaves the next one whole",
+         "NAME:x;\nFOO:1;HI:20;\nLOW:25;\n",
+         {{0, N}, {20, H}, {25, L}, {200, N}},
+         Lines({kNotTension})},
         {"a double-byte character after the terminator is passed over whole",
-         "NAME:x;ロLOW:30;\n", {{0, N}, {30, L}, {200, N}}, ""},
+         "NAME:x;ロLOW:30;\n",
+         {{0, N}, {30, L}, {200, N}},
+         ""},
     };
     for (const Case& c : cases)
     {
@@ -403,12 +412,11 @@ TEST(TensionParse, KeysAndValuesOfAnyLengthNeverOverrunABuffer)
          Lines({kNotTension})},
         {"400 blanks before a key", "NAME:x;\n" + blanks + "LOW:30;\n", 3, ""},
         {"400 blanks after a key", "NAME:x;\nLOW" + blanks + ":30;\n", 3, ""},
-        {"400 blanks inside a key", "NAME:x;\nLOW" + blanks + "T:30;\n", 2,
-         Lines({kNotTension})},
-        {"a time of 300 digits is a failed read",
-         "NAME:x;\nLOW:" + std::string(298, '0') + "30;\n", 2, Lines({kOutsideRange})},
-        {"a time of 300 characters with blanks around", "NAME:x;\nLOW:" + blanks + "30" + blanks + ";\n",
-         3, ""},
+        {"400 blanks inside a key", "NAME:x;\nLOW" + blanks + "T:30;\n", 2, Lines({kNotTension})},
+        {"a time of 300 digits is a failed read", "NAME:x;\nLOW:" + std::string(298, '0') + "30;\n",
+         2, Lines({kOutsideRange})},
+        {"a time of 300 characters with blanks around",
+         "NAME:x;\nLOW:" + blanks + "30" + blanks + ";\n", 3, ""},
     };
     for (const Case& c : cases)
     {
@@ -434,10 +442,11 @@ TEST(TensionParse, TwoFinalesFailAfterTheChecksHaveSpoken)
 {
     const Outcome outcome = Parse("CF:150;\nCLIMAX:190;\nCF:160;\n", 200.0);
     EXPECT_FALSE(outcome.accepted);
-    EXPECT_EQ(outcome.log,
-              Lines({"ファイル名 エラー[ファイル名を 1 ～ 40 文字以内にしてください]",
-                     "クライマックスフィナーレ エラー[クライマックスフィナーレが複数指定されています]",
-                     kIsCorrectError}));
+    EXPECT_EQ(
+        outcome.log,
+        Lines({"ファイル名 エラー[ファイル名を 1 ～ 40 文字以内にしてください]",
+               "クライマックスフィナーレ エラー[クライマックスフィナーレが複数指定されています]",
+               kIsCorrectError}));
 }
 
 TEST(TensionParse, EveryParseRebuildsTheTimelineAndKeepsNameAndComment)
@@ -459,8 +468,8 @@ TEST(TensionParse, SeparatorAndTerminatorAreParameters)
 {
     CTensionFile file;
     tension::CTextString log;
-    ASSERT_TRUE(file.Parse(tension_testing::Music(200.0), "NAME=x,\nLOW=30,\nHI:40;\n", '=', ',',
-                           &log));
+    ASSERT_TRUE(
+        file.Parse(tension_testing::Music(200.0), "NAME=x,\nLOW=30,\nHI:40;\n", '=', ',', &log));
     EXPECT_EQ(Keys(file), (std::vector<Key>{{0, N}, {30, L}, {200, N}}));
     EXPECT_FALSE(file.Parse(tension_testing::Music(200.0), nullptr, ':', ';', &log));
 }
@@ -468,8 +477,8 @@ TEST(TensionParse, SeparatorAndTerminatorAreParameters)
 TEST(TensionParse, ANullLogRecordsNothing)
 {
     CTensionFile file;
-    EXPECT_FALSE(file.Parse(tension_testing::Music(10.0), "FOO:1;\nLOW:0;\nCF:1;CF:2;", ':', ';',
-                            nullptr));
+    EXPECT_FALSE(
+        file.Parse(tension_testing::Music(10.0), "FOO:1;\nLOW:0;\nCF:1;CF:2;", ':', ';', nullptr));
 }
 
 TEST(TensionParse, ParseForLengthNeedsNoMusic)

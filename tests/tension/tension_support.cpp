@@ -4,9 +4,8 @@
 #include "tests/support/sound_device_fixture.h"
 #include "tests/support/temp_folder.h"
 
-#include <gtest/gtest.h>
-
 #include <cstring>
+#include <gtest/gtest.h>
 #include <map>
 #include <memory>
 
