@@ -17,6 +17,8 @@ CqvxPackFile::~CqvxPackFile()
 
 bool CqvxPackFile::AddEntry(const char* name, const void* data, std::uint32_t size)
 {
+    if (name == nullptr || (data == nullptr && size != 0))
+        return false;
     const std::size_t nameBytes = std::strlen(name) + 1;
     auto* copiedName = static_cast<char*>(base::AllocateZeroed(nameBytes));
     auto* copiedData = static_cast<std::uint8_t*>(base::AllocateZeroed(size));
@@ -42,6 +44,8 @@ bool CqvxPackFile::AddEntry(const char* name, const void* data, std::uint32_t si
 
 std::int32_t CqvxPackFile::FindEntry(const char* name) const
 {
+    if (name == nullptr)
+        return -1;
     for (std::uint32_t i = 0; i < count_; ++i)
     {
         if (std::strcmp(entries_[i].name, name) == 0)

@@ -261,6 +261,10 @@ TEST(TensionArchive, TheListIsTriedInOrderUntilOneSucceeds)
     EXPECT_NE(std::string(log.CStr()).find("File Buffer Conversion Error!!"), std::string::npos)
         << "the failing archive was tried first";
 
+    EXPECT_FALSE(
+        file.LoadFromArchiveList(Music(180.0), nullptr, CqvxPackFileList{archives, 5}, &log));
+    EXPECT_FALSE(without.AddEntry(nullptr, "", 0));
+
     const CqvxPackFile* none[] = {&without};
     CTensionFile missing;
     CTextString quiet;
