@@ -109,10 +109,15 @@ bool CResourceBase::SetName(const char* name)
         FreeName();
         return true;
     }
+    // Copied before the old name goes: `name` may be the name itself.
     const auto size = static_cast<std::uint32_t>(std::strlen(name) + 1);
-    if (!ReserveName(size))
+    auto* block = static_cast<char*>(base::AllocateZeroed(size));
+    if (block == nullptr)
         return false;
-    std::memcpy(name_, name, size);
+    std::memcpy(block, name, size);
+    FreeName();
+    name_ = block;
+    nameSize_ = size;
     return true;
 }
 

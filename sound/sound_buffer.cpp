@@ -104,6 +104,13 @@ CSoundBuffer* CSoundBuffer::Clone() const
 
 bool CSoundBuffer::Release()
 {
+    ReleaseBuffers();
+    CResourceBase::Release();
+    return true;
+}
+
+void CSoundBuffer::ReleaseBuffers()
+{
     for (std::uint32_t i = 0; i < instanceCount_; ++i)
         ReleaseInstance(instances_[i]);
     base::FreeBlock(instances_);
@@ -121,17 +128,16 @@ bool CSoundBuffer::Release()
     }
     sharedCount_ = nullptr;
     info_.format = nullptr;
-    CResourceBase::Release();
-    return true;
 }
 
 bool CSoundBuffer::Open(const char* path, std::uint32_t instanceCount, std::uint32_t capsFlags)
 {
     if (path == nullptr || (capsFlags & kCapsStatic) == 0)
         return false;
+    // The name stays until the new one replaces it: `path` may be the name.
     if (master_ != nullptr || info_.format != nullptr || sharedCount_ == nullptr)
     {
-        Release();
+        ReleaseBuffers();
         sharedCount_ = NewSharedCount();
         if (sharedCount_ == nullptr)
             return false;

@@ -89,6 +89,8 @@ public:
     DeviceBuffer* GetMasterBuffer() const { return master_; }
 
 private:
+    // Release without the name.
+    void ReleaseBuffers();
     bool PrepareInstance(PlayInstance& instance);
     static void ReleaseInstance(PlayInstance& instance);
 

@@ -321,6 +321,10 @@ TEST_F(SoundBufferTest, ReleaseMayRunTwiceAndAnOpenBufferCanBeOpenedAgain)
     EXPECT_STREQ(buffer.GetName(), "");
     ASSERT_TRUE(buffer.Open(first.c_str(), 1, kCapsStatic)) << "usable after a release";
     EXPECT_EQ(buffer.GetSharedCount(), 1u);
+    ASSERT_TRUE(buffer.Open(buffer.GetName(), 1, kCapsStatic)) << "its own name as the path";
+    EXPECT_STREQ(buffer.GetName(), first.c_str());
+    ASSERT_TRUE(buffer.SetName(buffer.GetName()));
+    EXPECT_STREQ(buffer.GetName(), first.c_str());
 }
 
 TEST_F(SoundBufferTest, AnyAllocationFailureFailsCleanly)
