@@ -1,0 +1,253 @@
+// Decoding speed and memory of a whole Ogg Vorbis file through
+// CSoundBuffer::Open, against Debian's oggdec on the same file.
+//
+// The benchmark makes its own input: 480 seconds of stereo 44.1 kHz music
+// encoded with libvorbisenc at quality 0.3 (oggenc's default -q 3). Each run
+// decodes it in a fresh process: ours (this program again, with --decode)
+// and `oggdec -Q -o /dev/null`, alternately; the medians of the wall times
+// are compared. The last line is `ratio R`, R = our time / oggdec's time.
+//
+// Peak memory is measured inside the decoding process: the growth of the
+// resident set's high-water mark (VmHWM) over the resident set before Open.
+// Target: ours within 1.10 x oggdec, peak at most file + 1.1 x PCM.
+#include "sound/sound_buffer.h"
+#include "tests/support/audio_fixtures.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <fcntl.h>
+#include <spawn.h>
+#include <string>
+#include <sys/wait.h>
+#include <time.h>
+#include <unistd.h>
+#include <vector>
+
+extern char** environ;
+
+namespace
+{
+
+constexpr long kSampleRate = 44100;
+constexpr int kChannels = 2;
+constexpr std::uint64_t kSeconds = 480;
+constexpr float kQuality = 0.3f;
+
+double Now()
+{
+    timespec now{};
+    clock_gettime(CLOCK_MONOTONIC, &now);
+    return double(now.tv_sec) + double(now.tv_nsec) * 1e-9;
+}
+
+// A "kB" field of /proc/self/status, in bytes.
+long long StatusBytes(const char* field)
+{
+    std::FILE* status = std::fopen("/proc/self/status", "r");
+    if (status == nullptr)
+        return -1;
+    char line[256];
+    long long bytes = -1;
+    const std::size_t length = std::strlen(field);
+    while (std::fgets(line, sizeof line, status) != nullptr)
+    {
+        if (std::strncmp(line, field, length) == 0 && line[length] == ':')
+            bytes = std::atoll(line + length + 1) * 1024;
+    }
+    std::fclose(status);
+    return bytes;
+}
+
+// The child: one Open, then "seconds peakGrowth dataBytes" on stdout.
+int DecodeOnce(const char* path)
+{
+    const long long before = StatusBytes("VmRSS");
+    sound::CSoundBuffer buffer;
+    const double start = Now();
+    const bool opened = buffer.Open(path, 1, sound::kCapsStatic);
+    const double seconds = Now() - start;
+    const long long peak = StatusBytes("VmHWM");
+    if (!opened)
+        return 1;
+    std::printf("%.6f %lld %u\n", seconds, peak - before, buffer.GetInfo().dataBytes);
+    return 0;
+}
+
+struct Spawned
+{
+    double seconds;
+    int status;
+    std::string output;
+};
+
+// Runs `argv` to its end; its output is kept when `capture`, else dropped.
+Spawned Run(const std::vector<std::string>& arguments, bool capture)
+{
+    std::vector<char*> argv;
+    for (const std::string& argument : arguments)
+        argv.push_back(const_cast<char*>(argument.c_str()));
+    argv.push_back(nullptr);
+    int channel[2] = {-1, -1};
+    posix_spawn_file_actions_t actions;
+    posix_spawn_file_actions_init(&actions);
+    if (capture && pipe(channel) == 0)
+    {
+        posix_spawn_file_actions_adddup2(&actions, channel[1], STDOUT_FILENO);
+        posix_spawn_file_actions_addclose(&actions, channel[0]);
+    }
+    else
+    {
+        posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, "/dev/null", O_WRONLY, 0);
+        posix_spawn_file_actions_addopen(&actions, STDERR_FILENO, "/dev/null", O_WRONLY, 0);
+    }
+    Spawned result{0.0, -1, {}};
+    const double start = Now();
+    pid_t child = 0;
+    if (posix_spawnp(&child, argv[0], &actions, nullptr, argv.data(), environ) == 0)
+    {
+        if (capture)
+        {
+            close(channel[1]);
+            char chunk[256];
+            for (ssize_t got; (got = read(channel[0], chunk, sizeof chunk)) > 0;)
+                result.output.append(chunk, std::size_t(got));
+            close(channel[0]);
+        }
+        waitpid(child, &result.status, 0);
+    }
+    result.seconds = Now() - start;
+    posix_spawn_file_actions_destroy(&actions);
+    return result;
+}
+
+// Music-like input: the tests' tune with a broadband layer (a soft noise
+// bed and a noise burst on every beat), so that the encoder spends bits as
+// it does on real music (about 110 kbit/s at quality 0.3) instead of
+// compressing bare tones to almost nothing.
+testing_support::SampleSource MusicSource()
+{
+    const testing_support::SampleSource tune = testing_support::TuneSource(kSampleRate);
+    return [tune](float** channels, int channelCount, int count, std::uint64_t first)
+    {
+        tune(channels, channelCount, count, first);
+        static std::uint32_t seed = 12345;
+        for (int i = 0; i < count; ++i)
+        {
+            const std::uint64_t n = first + std::uint64_t(i);
+            const double beat = double(n % (kSampleRate / 2)) / double(kSampleRate);
+            const double burst = beat < 0.08 ? 0.35 * (1.0 - beat / 0.08) : 0.0;
+            for (int c = 0; c < channelCount; ++c)
+            {
+                seed = seed * 1664525u + 1013904223u;
+                const double noise = double(seed >> 8) / double(1u << 24) * 2.0 - 1.0;
+                channels[c][i] += static_cast<float>(noise * (0.06 + burst));
+            }
+        }
+    };
+}
+
+double Median(std::vector<double> values)
+{
+    std::sort(values.begin(), values.end());
+    const std::size_t middle = values.size() / 2;
+    return values.size() % 2 != 0 ? values[middle] : (values[middle - 1] + values[middle]) / 2;
+}
+
+std::string SelfPath()
+{
+    char path[4096];
+    const ssize_t length = readlink("/proc/self/exe", path, sizeof path - 1);
+    return length > 0 ? std::string(path, std::size_t(length)) : std::string();
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    if (argc == 3 && std::strcmp(argv[1], "--decode") == 0)
+        return DecodeOnce(argv[2]);
+    int runs = 7;
+    if (argc == 3 && std::strcmp(argv[1], "--runs") == 0)
+        runs = std::max(1, std::atoi(argv[2]));
+
+#if defined(__SANITIZE_ADDRESS__)
+    std::printf("note: this build has AddressSanitizer: its figures say little; measure a\n"
+                "      Release build without sanitizers (see docs/performance.md)\n");
+#endif
+    if (Run({"oggdec", "-Q", "--help"}, false).status != 0)
+    {
+        std::fprintf(stderr, "oggdec is missing: apt-get install -y vorbis-tools\n");
+        return 2;
+    }
+
+    char folder[] = "/tmp/vek-bench-XXXXXX";
+    if (mkdtemp(folder) == nullptr)
+        return 2;
+    const std::string path = std::string(folder) + "/music.ogg";
+    testing_support::OggSpec spec;
+    spec.channels = kChannels;
+    spec.sampleRate = kSampleRate;
+    spec.samplesPerChannel = kSeconds * kSampleRate;
+    spec.quality = kQuality;
+    const double encodeStart = Now();
+    const testing_support::Bytes ogg = testing_support::EncodeOggVorbis(spec, MusicSource());
+    std::FILE* out = std::fopen(path.c_str(), "wb");
+    if (out == nullptr || std::fwrite(ogg.data(), 1, ogg.size(), out) != ogg.size() ||
+        std::fclose(out) != 0)
+    {
+        std::fprintf(stderr, "cannot write %s\n", path.c_str());
+        return 2;
+    }
+    const double pcmBytes = double(spec.samplesPerChannel) * kChannels * 2;
+    std::printf("input: %llu s stereo %ld Hz Ogg Vorbis at quality %.1f, %zu bytes "
+                "(encoded in %.1f s); PCM %.0f bytes\n",
+                static_cast<unsigned long long>(kSeconds), kSampleRate, kQuality, ogg.size(),
+                Now() - encodeStart, pcmBytes);
+
+    const std::string self = SelfPath();
+    std::vector<double> ours, opens, oggdec, peaks;
+    for (int run = 0; run < runs; ++run)
+    {
+        const Spawned reference = Run({"oggdec", "-Q", "-o", "/dev/null", path}, false);
+        const Spawned decoded = Run({self, "--decode", path}, true);
+        double openSeconds = 0;
+        long long peak = 0;
+        unsigned dataBytes = 0;
+        if (decoded.status != 0 || reference.status != 0 ||
+            std::sscanf(decoded.output.c_str(), "%lf %lld %u", &openSeconds, &peak, &dataBytes) !=
+                3 ||
+            double(dataBytes) != pcmBytes)
+        {
+            std::fprintf(stderr, "run %d failed (ours %d, oggdec %d)\n", run, decoded.status,
+                         reference.status);
+            return 1;
+        }
+        ours.push_back(decoded.seconds);
+        opens.push_back(openSeconds);
+        oggdec.push_back(reference.seconds);
+        peaks.push_back(double(peak));
+        std::printf("run %d: ours %.3f s (Open %.3f s), oggdec %.3f s, peak %.1f MiB\n", run,
+                    decoded.seconds, openSeconds, reference.seconds, double(peak) / 1048576.0);
+    }
+    std::remove(path.c_str());
+    rmdir(folder);
+
+    const double ourTime = Median(ours);
+    const double theirTime = Median(oggdec);
+    const double peak = *std::max_element(peaks.begin(), peaks.end());
+    const double fileBytes = double(ogg.size());
+    const double ratio = ourTime / theirTime;
+    const double allowed = fileBytes + 1.1 * pcmBytes;
+    std::printf("ours (CSoundBuffer::Open in a fresh process), median of %d: %.3f s "
+                "(Open alone %.3f s)\n",
+                runs, ourTime, Median(opens));
+    std::printf("oggdec -Q -o /dev/null, median of %d: %.3f s\n", runs, theirTime);
+    std::printf("peak memory during Open: %.0f bytes = file + %.3f x PCM "
+                "(target at most file + 1.1 x PCM = %.0f bytes): %s\n",
+                peak, (peak - fileBytes) / pcmBytes, allowed, peak <= allowed ? "met" : "missed");
+    std::printf("time target (ratio at most 1.10): %s\n", ratio <= 1.10 ? "met" : "missed");
+    std::printf("ratio %.3f\n", ratio);
+    return 0;
+}

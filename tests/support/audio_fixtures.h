@@ -1,0 +1,77 @@
+#pragma once
+
+// Audio files made by the tests themselves: a RIFF writer and Ogg Vorbis
+// through libvorbisenc. Shared by the tests, the benchmark and fuzzing.
+#include <cstddef>
+#include <cstdint>
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace testing_support
+{
+
+using Bytes = std::vector<std::uint8_t>;
+
+// A RIFF file built chunk by chunk; every chunk is padded to an even size.
+class RiffWriter
+{
+public:
+    // A chunk whose size field is the body's size.
+    RiffWriter& Chunk(const char* id, const Bytes& body);
+    // A chunk whose size field claims `claimedSize` whatever the body holds
+    // (a truncated data chunk, for one).
+    RiffWriter& ChunkClaiming(const char* id, std::uint32_t claimedSize, const Bytes& body);
+    // "RIFF", the size of what follows, the form type and the chunks.
+    Bytes Finish(const char* form = "WAVE") const;
+
+private:
+    Bytes chunks_;
+};
+
+struct WaveSpec
+{
+    std::uint16_t formatTag = 1;
+    std::uint16_t channels = 2;
+    std::uint32_t sampleRate = 44100;
+    std::uint16_t bitsPerSample = 16;
+    // Written after a u16 count for a tag other than 1.
+    Bytes extra;
+    std::uint32_t dataBytes = 0;
+};
+
+// The body of a "fmt " chunk: 16 bytes for PCM, else 18 plus the extra bytes.
+Bytes FormatChunkBody(const WaveSpec& spec);
+// `size` bytes of a repeating pattern, so that misplaced data shows.
+Bytes PatternBytes(std::size_t size);
+// A whole wave file: "fmt " and a "data" chunk of spec.dataBytes pattern bytes.
+Bytes MakeWave(const WaveSpec& spec);
+// A wave of `seconds` of 8-bit mono at 1000 Hz: small and exact, for tests
+// that need music of a given length.
+Bytes MakeWaveOfLength(double seconds);
+
+struct OggSpec
+{
+    int channels = 2;
+    long sampleRate = 44100;
+    std::uint64_t samplesPerChannel = 44100;
+    float quality = 0.1f;
+};
+
+// Fills `count` samples of each channel (`channels[c][i]`, in -1..1), the
+// first of them being sample number `first` of the stream.
+using SampleSource =
+    std::function<void(float** channels, int channelCount, int count, std::uint64_t first)>;
+
+// A tune: a few tones that move, so that the encoder has real work.
+SampleSource TuneSource(long sampleRate);
+
+// Encodes exactly spec.samplesPerChannel samples per channel.
+Bytes EncodeOggVorbis(const OggSpec& spec, const SampleSource& source);
+Bytes EncodeOggVorbis(const OggSpec& spec);
+
+// The pages of an Ogg stream, each a complete page with its header.
+std::vector<Bytes> SplitOggPages(const Bytes& stream);
+Bytes JoinOggPages(const std::vector<Bytes>& pages);
+
+} // namespace testing_support
