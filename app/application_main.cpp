@@ -2,10 +2,11 @@
 
 #include "app/system.h"
 #include "input/input.h"
+#include "sound/sound_device.h"
 
 CApplicationMain::CApplicationMain()
-    : system_(nullptr), graphicsDevice_(nullptr), input_(nullptr), comObject_(nullptr),
-      textInput_(nullptr), timerRaised_(false)
+    : system_(nullptr), graphicsDevice_(nullptr), input_(nullptr), sound_(nullptr),
+      comObject_(nullptr), textInput_(nullptr), timerRaised_(false)
 {
 }
 
@@ -51,6 +52,11 @@ void CApplicationMain::ReleaseBase()
     {
         delete input_;
         input_ = nullptr;
+    }
+    if (sound_ != nullptr)
+    {
+        delete sound_;
+        sound_ = nullptr;
     }
     if (system_ != nullptr)
     {

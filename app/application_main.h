@@ -7,6 +7,10 @@ namespace input
 {
 class CInput;
 }
+namespace sound
+{
+class CSound;
+}
 
 // The in-house application framework's life cycle. The game's own start-up
 // (top-level window, graphics device, COM) lives in the game; the tool
@@ -37,6 +41,7 @@ protected:
     CSystem* system_;
     void* graphicsDevice_;
     input::CInput* input_;
+    sound::CSound* sound_;
     void* comObject_;
     void* textInput_;
     bool timerRaised_;

@@ -3,6 +3,7 @@
 #include "app/system.h"
 #include "input/input.h"
 #include "resources/resource.h"
+#include "sound/sound_device.h"
 
 #include <commctrl.h>
 #include <new>
@@ -68,6 +69,10 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
                                      reinterpret_cast<DLGPROC>(procedure), nullptr))
         return false;
     procedure_ = procedure;
+
+    sound_ = new (std::nothrow) sound::CSound();
+    if (sound_ == nullptr || !sound_->Init(system_->GetHwnd()))
+        return false;
 
     input_ = new (std::nothrow) input::CInput();
     if (input_ == nullptr)
