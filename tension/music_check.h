@@ -6,8 +6,17 @@
 
 #include "tension/text_string.h"
 
+#include <functional>
+
+namespace sound
+{
+class CSoundBuffer;
+}
+
 namespace tension
 {
+
+class CTensionFile;
 
 enum class MusicCheckResult
 {
@@ -40,5 +49,26 @@ enum class MusicCheckResult
 // no device is needed.
 MusicCheckResult CheckMusicRow(const char* musicPath, const char* tensionPath,
                                CTextString* message);
+
+// What one check used, for a caller that explains its outcome to an author
+// (how long the music is, the timeline, the warnings the user is not shown).
+// Valid only during the inspector's call.
+struct MusicCheckInspection
+{
+    MusicCheckResult result;
+    // Null when the music could not be opened; then so is `tensionFile`.
+    const sound::CSoundBuffer* music;
+    // As the load left it: without a timeline when the file could not be
+    // read.
+    CTensionFile* tensionFile;
+    // Everything the load recorded; on acceptance these are the warnings.
+    const CTextString* log;
+};
+using MusicCheckInspector = std::function<void(const MusicCheckInspection&)>;
+
+// The same check; `inspect` is called once at its end, before the two
+// objects are released.
+MusicCheckResult CheckMusicRow(const char* musicPath, const char* tensionPath, CTextString* message,
+                               const MusicCheckInspector& inspect);
 
 } // namespace tension
