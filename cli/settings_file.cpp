@@ -14,7 +14,10 @@ namespace
 
 std::string Quoted(const std::string& path)
 {
-    return "\"" + Utf8FromNative(path) + "\"";
+    std::string quoted = "\"";
+    quoted += Utf8FromNative(path);
+    quoted += '"';
+    return quoted;
 }
 
 } // namespace

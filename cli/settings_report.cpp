@@ -265,7 +265,8 @@ Setting RadioChat(const config::ConfigRadioChat& radioChat)
     for (int i = 0; i < config::kRadioChatCount; ++i)
     {
         const config::RadioChatEntry& stored = radioChat.entries[i];
-        const std::string key = "F" + std::to_string(i + 1);
+        std::string key = "F";
+        key += std::to_string(i + 1);
         const std::string everyone = Utf8FromCp932("全体");
         Setting entry = Group("");
         entry.children.push_back(

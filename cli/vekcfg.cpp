@@ -71,9 +71,12 @@ int Check(const Invocation& invocation)
         return status;
     if (!run.figures.hasTimeline)
     {
-        Complain("\"" + Utf8FromNative(invocation.svgPath) + "\" not written: " +
-                 (run.figures.musicOpened ? "the tension file could not be read"
-                                          : "the music could not be opened"));
+        std::string complaint = "\"";
+        complaint += Utf8FromNative(invocation.svgPath);
+        complaint += "\" not written: ";
+        complaint += run.figures.musicOpened ? "the tension file could not be read"
+                                             : "the music could not be opened";
+        Complain(complaint);
         return status;
     }
     std::string error;
