@@ -45,29 +45,16 @@ private:
         return true;
     }
 
-    static void AppendUtf8(std::string& out, unsigned code)
+    // The escapes vekcfg writes are of control characters only.
+    bool ControlEscape(std::string* out)
     {
-        if (code < 0x80)
-            out += char(code);
-        else if (code < 0x800)
-            out += {char(0xC0 | code >> 6), char(0x80 | (code & 0x3F))};
-        else if (code < 0x10000)
-            out += {char(0xE0 | code >> 12), char(0x80 | (code >> 6 & 0x3F)),
-                    char(0x80 | (code & 0x3F))};
-        else
-            out += {char(0xF0 | code >> 18), char(0x80 | (code >> 12 & 0x3F)),
-                    char(0x80 | (code >> 6 & 0x3F)), char(0x80 | (code & 0x3F))};
-    }
-
-    bool Hex4(unsigned* code)
-    {
-        if (position_ + 4 > text_.size())
+        if (position_ + 4 > text_.size() || text_.compare(position_, 2, "00") != 0)
             return false;
         char* end = nullptr;
-        const std::string digits = text_.substr(position_, 4);
-        *code = unsigned(std::strtoul(digits.c_str(), &end, 16));
+        const std::string digits = text_.substr(position_ + 2, 2);
+        *out += char(std::strtoul(digits.c_str(), &end, 16));
         position_ += 4;
-        return end == digits.c_str() + 4;
+        return end == digits.c_str() + 2;
     }
 
     bool String(std::string* out)
@@ -96,17 +83,8 @@ private:
                 *out += meant[at];
                 continue;
             }
-            unsigned code = 0;
-            if (escape != 'u' || !Hex4(&code))
+            if (escape != 'u' || !ControlEscape(out))
                 return false;
-            if (code >= 0xD800 && code < 0xDC00)
-            {
-                unsigned low = 0;
-                if (!Word("\\u") || !Hex4(&low) || low < 0xDC00 || low >= 0xE000)
-                    return false;
-                code = 0x10000 + ((code - 0xD800) << 10) + (low - 0xDC00);
-            }
-            AppendUtf8(*out, code);
         }
         return false;
     }
