@@ -30,7 +30,7 @@ constexpr double kFinaleFactor1 = 0.1f;
 constexpr double kFinaleFactor2 = 0.2f;
 constexpr double kHiFactor = 0.2f;
 constexpr double kClimaxFactor = 0.1f;
-constexpr int kLevelCount = 4;
+constexpr int kLevelCount = kTensionLevelCount;
 constexpr int kNoLevel = 4;
 constexpr int kSegmentLimits[kLevelCount] = {4, 10, 4, 2};
 constexpr const char* kLevelNames[kLevelCount] = {"LowTension", "NormalTension", "HiTension",
@@ -193,6 +193,12 @@ private:
 };
 
 } // namespace
+
+const char* LevelMessageName(TensionLevel level)
+{
+    const auto index = static_cast<int>(level);
+    return index >= 0 && index < kLevelCount ? kLevelNames[index] : "";
+}
 
 CTensionFile::CTensionFile() = default;
 
@@ -605,10 +611,9 @@ bool CTensionFile::CheckTimeline(sound::CSoundBuffer* sound, CTextString* log)
     return CheckTimelineFor(LengthOf(sound), log);
 }
 
-bool CTensionFile::CheckTimelineFor(float length, CTextString* log)
+TimelineTally CTensionFile::TallyTimeline(float length) const
 {
-    float totals[kLevelCount] = {};
-    int segments[kLevelCount] = {};
+    TimelineTally tally{};
     const std::uint32_t keys = timeline_ != nullptr ? timeline_->GetKeyCount() : 0;
     for (std::uint32_t i = 0; i + 1 < keys; ++i)
     {
@@ -616,37 +621,50 @@ bool CTensionFile::CheckTimelineFor(float length, CTextString* log)
         const KeyFrame* next = timeline_->GetKey(i + 1);
         if (key->value < 0 || key->value >= kLevelCount)
             continue;
-        totals[key->value] += next->time - key->time;
-        ++segments[key->value];
+        tally.levels[key->value].totalSeconds += next->time - key->time;
+        ++tally.levels[key->value].segments;
     }
-    // The integer part of the limit; lengths beyond 480 s never reach here
-    // from IsCorrect, the clamp only keeps a direct call defined.
+    // The integer part of the limit; lengths beyond 480 s never reach the
+    // check from IsCorrect, the clamp only keeps a direct call defined.
     const auto limit = [length](double factor)
     {
         const double product = std::trunc(length * factor);
         return product < 1.0e9 ? static_cast<int>(product) : 1000000000;
     };
-    const int timeLimits[kLevelCount] = {-1, -1, limit(kHiFactor), limit(kClimaxFactor)};
+    const int timeLimits[kLevelCount] = {kNoTimeLimit, kNoTimeLimit, limit(kHiFactor),
+                                         limit(kClimaxFactor)};
+    for (int level = 0; level < kLevelCount; ++level)
+    {
+        tally.levels[level].timeLimit = timeLimits[level];
+        tally.levels[level].segmentLimit = kSegmentLimits[level];
+    }
+    return tally;
+}
 
+bool CTensionFile::CheckTimelineFor(float length, CTextString* log)
+{
+    const TimelineTally tally = TallyTimeline(length);
     bool correct = true;
     for (int level = 0; level < kLevelCount; ++level)
     {
-        if (timeLimits[level] >= 0 && totals[level] > static_cast<float>(timeLimits[level]))
+        const LevelTally& measured = tally.levels[level];
+        if (measured.timeLimit != kNoTimeLimit &&
+            measured.totalSeconds > static_cast<float>(measured.timeLimit))
         {
             RecordFormatted(log, "%s 時間オーバー[現在 %f 秒です %d 秒以内にしてください]",
-                            kLevelNames[level], static_cast<double>(totals[level]),
-                            timeLimits[level]);
+                            kLevelNames[level], static_cast<double>(measured.totalSeconds),
+                            measured.timeLimit);
             correct = false;
         }
-        if (segments[level] > kSegmentLimits[level])
+        if (measured.segments > measured.segmentLimit)
         {
             RecordFormatted(log, "%s 回数オーバー[現在 %d 回です %d 回以内にしてください]",
-                            kLevelNames[level], segments[level], kSegmentLimits[level]);
+                            kLevelNames[level], measured.segments, measured.segmentLimit);
             correct = false;
         }
     }
-    const float low = totals[static_cast<int>(TensionLevel::Low)];
-    const float hi = totals[static_cast<int>(TensionLevel::Hi)];
+    const float low = tally.levels[static_cast<int>(TensionLevel::Low)].totalSeconds;
+    const float hi = tally.levels[static_cast<int>(TensionLevel::Hi)].totalSeconds;
     if (hi > low)
     {
         RecordFormatted(log, "%s 時間不足[現在 %f 秒です HiTension 時間の %f 秒以上必要です]",

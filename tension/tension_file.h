@@ -25,6 +25,30 @@ enum class TensionLevel : std::int32_t
     Climax = 3,
 };
 
+// The name the check's messages give a level: "LowTension", "NormalTension",
+// "HiTension", "ClimaxTension".
+const char* LevelMessageName(TensionLevel level);
+
+// What the timeline check measures for one level, and the limits it holds
+// the level to.
+struct LevelTally
+{
+    float totalSeconds;
+    int segments;
+    // Whole seconds; kNoTimeLimit for the levels without one.
+    int timeLimit;
+    int segmentLimit;
+};
+
+inline constexpr int kNoTimeLimit = -1;
+inline constexpr int kTensionLevelCount = 4;
+
+// One tally per level, indexed by the level's value.
+struct TimelineTally
+{
+    LevelTally levels[kTensionLevelCount];
+};
+
 // A tension file: a timeline of tension levels over one piece of music, an
 // optional climax-finale mark, a display name and a comment, parsed from
 // code page 932 text and validated against the music's length. Messages go
@@ -88,6 +112,10 @@ public:
     float GetFinaleWindow() const { return finaleWindow_; }
     // Null until the first parse.
     const CKeyFrameList* GetTimeline() const { return timeline_; }
+    // What CheckTimeline weighs against music of `length` seconds: the
+    // totals and segment counts of the present timeline and their limits.
+    // Authors' tools read it after a check to say by how much a file fails.
+    TimelineTally TallyTimeline(float length) const;
 
 private:
     // Steps 1 to 4 of Parse: false when the text is null, the timeline

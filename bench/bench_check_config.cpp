@@ -1,0 +1,243 @@
+// `vekcfg check-config` on a settings file with ten rows of 240-second Ogg
+// Vorbis music, against ten sequential `oggdec` runs of the same files.
+//
+// The benchmark makes its own input: 240 seconds of stereo 44.1 kHz music
+// encoded with libvorbisenc at quality 0.3 (oggenc's default -q 3), written
+// under ten names, each with a tension file the check accepts, and a
+// settings file whose ten rows name them. Each round times, alternately,
+// one `vekcfg check-config` process (all ten checks) and ten
+// `oggdec -Q -o /dev/null` processes one after the other; the medians of the
+// rounds are compared. The last line is `ratio R`, R = vekcfg's time /
+// oggdec's time. Target: at most 1.15.
+#include "config/save_config.h"
+#include "tests/support/audio_fixtures.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <fcntl.h>
+#include <spawn.h>
+#include <string>
+#include <sys/wait.h>
+#include <time.h>
+#include <unistd.h>
+#include <vector>
+
+extern char** environ;
+
+namespace
+{
+
+constexpr int kRows = 10;
+constexpr long kSampleRate = 44100;
+constexpr std::uint64_t kSeconds = 240;
+
+double Now()
+{
+    timespec now{};
+    clock_gettime(CLOCK_MONOTONIC, &now);
+    return double(now.tv_sec) + double(now.tv_nsec) * 1e-9;
+}
+
+struct Spawned
+{
+    int status = -1;
+    std::string output;
+};
+
+// Runs `arguments` to its end; its output is kept when `capture`, else
+// dropped.
+Spawned Run(const std::vector<std::string>& arguments, bool capture)
+{
+    std::vector<char*> argv;
+    for (const std::string& argument : arguments)
+        argv.push_back(const_cast<char*>(argument.c_str()));
+    argv.push_back(nullptr);
+    int channel[2] = {-1, -1};
+    posix_spawn_file_actions_t actions;
+    posix_spawn_file_actions_init(&actions);
+    if (capture && pipe(channel) == 0)
+    {
+        posix_spawn_file_actions_adddup2(&actions, channel[1], STDOUT_FILENO);
+        posix_spawn_file_actions_addclose(&actions, channel[0]);
+    }
+    else
+    {
+        posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, "/dev/null", O_WRONLY, 0);
+    }
+    posix_spawn_file_actions_addopen(&actions, STDERR_FILENO, "/dev/null", O_WRONLY, 0);
+    Spawned result;
+    pid_t child = 0;
+    if (posix_spawnp(&child, argv[0], &actions, nullptr, argv.data(), environ) == 0)
+    {
+        if (capture)
+        {
+            close(channel[1]);
+            char chunk[512];
+            for (ssize_t got; (got = read(channel[0], chunk, sizeof chunk)) > 0;)
+                result.output.append(chunk, std::size_t(got));
+            close(channel[0]);
+        }
+        waitpid(child, &result.status, 0);
+    }
+    posix_spawn_file_actions_destroy(&actions);
+    return result;
+}
+
+// Music-like input: the tests' tune over a soft noise bed with a burst on
+// every beat, so that the encoder spends bits as on real music.
+testing_support::SampleSource MusicSource()
+{
+    const testing_support::SampleSource tune = testing_support::TuneSource(kSampleRate);
+    return [tune](float** channels, int channelCount, int count, std::uint64_t first)
+    {
+        tune(channels, channelCount, count, first);
+        static std::uint32_t seed = 2024;
+        for (int i = 0; i < count; ++i)
+        {
+            const double beat =
+                double((first + std::uint64_t(i)) % (kSampleRate / 2)) / double(kSampleRate);
+            const double level = 0.06 + (beat < 0.08 ? 0.35 * (1.0 - beat / 0.08) : 0.0);
+            for (int c = 0; c < channelCount; ++c)
+            {
+                seed = seed * 1664525u + 1013904223u;
+                channels[c][i] +=
+                    static_cast<float>((double(seed >> 8) / double(1u << 24) * 2.0 - 1.0) * level);
+            }
+        }
+    };
+}
+
+bool WriteFile(const std::string& path, const void* data, std::size_t size)
+{
+    std::FILE* out = std::fopen(path.c_str(), "wb");
+    const bool written = out != nullptr && std::fwrite(data, 1, size, out) == size;
+    return out != nullptr && std::fclose(out) == 0 && written;
+}
+
+double Median(std::vector<double> values)
+{
+    std::sort(values.begin(), values.end());
+    const std::size_t middle = values.size() / 2;
+    return values.size() % 2 != 0 ? values[middle] : (values[middle - 1] + values[middle]) / 2;
+}
+
+std::string BesideSelf(const char* name)
+{
+    char path[4096];
+    const ssize_t length = readlink("/proc/self/exe", path, sizeof path - 1);
+    const std::string self(path, length > 0 ? std::size_t(length) : 0);
+    return self.substr(0, self.find_last_of('/') + 1) + name;
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    int rounds = 5;
+    if (argc == 3 && std::strcmp(argv[1], "--runs") == 0)
+        rounds = std::max(1, std::atoi(argv[2]));
+
+#if defined(__SANITIZE_ADDRESS__)
+    std::printf("note: this build has AddressSanitizer: its figures say little; measure a\n"
+                "      Release build without sanitizers (see docs/performance.md)\n");
+#endif
+    const std::string vekcfg = BesideSelf("vekcfg");
+    if (Run({"oggdec", "-Q", "--help"}, false).status != 0)
+    {
+        std::fprintf(stderr, "oggdec is missing: apt-get install -y vorbis-tools\n");
+        return 2;
+    }
+    if (access(vekcfg.c_str(), X_OK) != 0)
+    {
+        std::fprintf(stderr, "%s is missing: build the vekcfg target\n", vekcfg.c_str());
+        return 2;
+    }
+
+    char folder[] = "/tmp/vek-bench-XXXXXX";
+    if (mkdtemp(folder) == nullptr)
+        return 2;
+    testing_support::OggSpec spec;
+    spec.channels = 2;
+    spec.sampleRate = kSampleRate;
+    spec.samplesPerChannel = kSeconds * kSampleRate;
+    spec.quality = 0.3f;
+    const double encodeStart = Now();
+    const testing_support::Bytes ogg = testing_support::EncodeOggVorbis(spec, MusicSource());
+    const double encodeSeconds = Now() - encodeStart;
+
+    // Limits for 240 s: Hi at most 48 s, Climax at most 24 s.
+    const char tension[] = "FILENAME:Bench;\nLOW:30;\nHI:60;\nLOW:100;\nCLIMAX:220;\n"
+                           "FINALE:230;\n";
+    config::CSaveConfig record;
+    record.ResetAll();
+    std::vector<std::string> music;
+    std::vector<std::string> created;
+    for (int row = 0; row < kRows; ++row)
+    {
+        const std::string base = std::string(folder) + "/row" + std::to_string(row + 1);
+        music.push_back(base + ".ogg");
+        const std::string tensionPath = base + ".txt";
+        if (!WriteFile(music.back(), ogg.data(), ogg.size()) ||
+            !WriteFile(tensionPath, tension, sizeof tension - 1))
+        {
+            std::fprintf(stderr, "cannot write into %s\n", folder);
+            return 2;
+        }
+        created.push_back(music.back());
+        created.push_back(tensionPath);
+        config::UserBgmRow& stored = record.UserBgm()->rows[row];
+        std::snprintf(stored.musicPath, sizeof stored.musicPath, "%s", music.back().c_str());
+        std::snprintf(stored.tensionPath, sizeof stored.tensionPath, "%s", tensionPath.c_str());
+    }
+    const std::string settings = std::string(folder) + "/GameConfig.dat";
+    if (!record.SaveToPath(settings.c_str()))
+        return 2;
+    created.push_back(settings);
+    std::printf("input: %d rows of %llu s stereo %ld Hz Ogg Vorbis at quality 0.3, %zu bytes "
+                "each (encoded in %.1f s); PCM %.0f bytes each\n",
+                kRows, static_cast<unsigned long long>(kSeconds), kSampleRate, ogg.size(),
+                encodeSeconds, double(spec.samplesPerChannel) * 2 * 2);
+
+    std::vector<double> ours, theirs;
+    for (int round = 0; round < rounds; ++round)
+    {
+        double start = Now();
+        for (const std::string& path : music)
+        {
+            if (Run({"oggdec", "-Q", "-o", "/dev/null", path}, false).status != 0)
+            {
+                std::fprintf(stderr, "oggdec failed on %s\n", path.c_str());
+                return 1;
+            }
+        }
+        theirs.push_back(Now() - start);
+
+        start = Now();
+        const Spawned checked = Run({vekcfg, "check-config", settings}, true);
+        ours.push_back(Now() - start);
+        const long lines = std::count(checked.output.begin(), checked.output.end(), '\n');
+        if (checked.status != 0 || lines != kRows)
+        {
+            std::fprintf(stderr, "vekcfg check-config failed (status %d):\n%s\n", checked.status,
+                         checked.output.c_str());
+            return 1;
+        }
+        std::printf("round %d: vekcfg check-config %.3f s, 10 x oggdec %.3f s\n", round,
+                    ours.back(), theirs.back());
+    }
+    for (const std::string& path : created)
+        std::remove(path.c_str());
+    rmdir(folder);
+
+    const double ourTime = Median(ours);
+    const double theirTime = Median(theirs);
+    const double ratio = ourTime / theirTime;
+    std::printf("vekcfg check-config (10 rows), median of %d: %.3f s\n", rounds, ourTime);
+    std::printf("10 sequential oggdec -Q -o /dev/null, median of %d: %.3f s\n", rounds, theirTime);
+    std::printf("time target (ratio at most 1.15): %s\n", ratio <= 1.15 ? "met" : "missed");
+    std::printf("ratio %.3f\n", ratio);
+    return 0;
+}

@@ -1,0 +1,70 @@
+// Linux: iconv for code page 932; the command line and the terminal are
+// taken to be UTF-8.
+#include "cli/encoding.h"
+
+#include <cerrno>
+#include <iconv.h>
+
+namespace cli
+{
+namespace
+{
+
+constexpr char kReplacement[] = "\xEF\xBF\xBD";
+
+} // namespace
+
+std::string Utf8FromCp932(std::string_view text)
+{
+    std::string converted;
+    converted.reserve(text.size() * 3 / 2);
+    iconv_t converter = iconv_open("UTF-8", "CP932");
+    if (converter == reinterpret_cast<iconv_t>(-1))
+    {
+        // Without the code page only ASCII can be trusted.
+        for (std::size_t size; (size = Cp932CharacterSize(text)) != 0; text.remove_prefix(size))
+        {
+            if (size == 1 && static_cast<unsigned char>(text[0]) < 0x80)
+                converted += text[0];
+            else
+                converted += kReplacement;
+        }
+        return converted;
+    }
+    // One character at a time: iconv's own error recovery cannot tell how
+    // many bytes an unmapped character spans.
+    while (!text.empty())
+    {
+        const std::size_t size = Cp932CharacterSize(text);
+        char* in = const_cast<char*>(text.data());
+        std::size_t inLeft = size;
+        char out[8];
+        char* outNext = out;
+        std::size_t outLeft = sizeof out;
+        if (iconv(converter, &in, &inLeft, &outNext, &outLeft) == static_cast<std::size_t>(-1))
+        {
+            iconv(converter, nullptr, nullptr, nullptr, nullptr);
+            converted += kReplacement;
+        }
+        else
+        {
+            converted.append(out, static_cast<std::size_t>(outNext - out));
+        }
+        text.remove_prefix(size);
+    }
+    iconv_close(converter);
+    return converted;
+}
+
+std::string Utf8FromNative(std::string_view text)
+{
+    return std::string(text);
+}
+
+void WriteConsoleText(std::FILE* stream, std::string_view utf8)
+{
+    std::fwrite(utf8.data(), 1, utf8.size(), stream);
+    std::fflush(stream);
+}
+
+} // namespace cli
