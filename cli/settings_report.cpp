@@ -2,6 +2,7 @@
 
 #include "cli/encoding.h"
 #include "config/ip_address.h"
+#include "config/setting_names.h"
 #include "dialog/page_values.h"
 #include "input/name_tables.h"
 
@@ -16,42 +17,8 @@ namespace
 using Kind = Setting::Kind;
 
 // The choices of the pages' combo boxes, by the index the record stores.
-const char* const kHdrLevels[] = {"なし", "LEVEL1", "LEVEL2", "LEVEL3", "LEVEL4"};
-const char* const kTrailQualities[] = {"なし", "低", "中", "高", "最高"};
-const char* const kLockOnTypes[] = {"距離優先", "キャラ正面優先", "カメラ正面優先", "順送り"};
-const char* const kRadarTypes[] = {"固定", "回転"};
-const char* const kCameraPositions[] = {"左", "右"};
-const char* const kGuardCorrections[] = {"OFF", "ON"};
-const char* const kArcadeDifficulties[] = {"Easy", "Normal", "Hard", "Lunatic"};
-const char* const kKeyResponses[] = {"1", "2", "3", "4", "5"};
 
 // The key assignment pages' label of each action.
-const char* const kActionLabels[config::kActionCount] = {
-    "使用しない",
-    "使用しない",
-    "使用しない",
-    "使用しない",
-    "移動上",
-    "移動下",
-    "移動左",
-    "移動右",
-    "カメラ正面",
-    "使用しない",
-    "使用しない",
-    "使用しない",
-    "使用しない",
-    "使用しない",
-    "スライド/決定",
-    "ガード/キャンセル",
-    "射撃",
-    "近接攻撃",
-    "ロック変更",
-    "上昇",
-    "トリガー",
-    "下降",
-    "メニュー/スタート",
-    "命令変更",
-};
 
 Setting Group(std::string name)
 {
@@ -119,18 +86,19 @@ Setting Volume(std::string name, std::int32_t value)
 
 std::string ActionMeaning(int action, const char* name)
 {
-    const std::string label = Utf8FromCp932(kActionLabels[action]);
+    const std::string label = Utf8FromCp932(config::kActionLabels[action]);
     return label + ": " + (*name != '\0' ? std::string(name) : std::string("(no name)"));
 }
 
 Setting Graphics(const config::ConfigGraphics& graphics)
 {
     Setting group = Group("graphics");
-    group.children.push_back(Choice("screenSize", graphics.screenSize, dialog::kResolutionNames));
+    group.children.push_back(Choice("screenSize", graphics.screenSize, config::kResolutionNames));
     group.children.push_back(Number("fullScreen", graphics.fullScreen, OnOff(graphics.fullScreen)));
     group.children.push_back(Number("showMovie", graphics.showMovie, OnOff(graphics.showMovie)));
-    group.children.push_back(Choice("hdrLevel", graphics.hdrLevel, kHdrLevels));
-    group.children.push_back(Choice("trailQuality", graphics.trailQuality, kTrailQualities));
+    group.children.push_back(Choice("hdrLevel", graphics.hdrLevel, config::kHdrLevelNames));
+    group.children.push_back(
+        Choice("trailQuality", graphics.trailQuality, config::kTrailQualityNames));
     return group;
 }
 
@@ -144,13 +112,15 @@ Setting Game(const config::ConfigGame& game)
     children.push_back(Volume("seVolume", game.seVolume));
     children.push_back(Volume("voiceVolume", game.voiceVolume));
     children.push_back(Number("voicePlayback", game.voicePlayback, OnOff(game.voicePlayback)));
-    children.push_back(Choice("lockOnType", game.lockOnType, kLockOnTypes));
-    children.push_back(Choice("radarType", game.radarType, kRadarTypes));
-    children.push_back(Choice("cameraPosition", game.cameraPosition, kCameraPositions));
-    children.push_back(Choice("guardCorrection", game.guardCorrection, kGuardCorrections));
-    children.push_back(Choice("arcadeDifficulty", game.arcadeDifficulty, kArcadeDifficulties));
+    children.push_back(Choice("lockOnType", game.lockOnType, config::kLockOnTypeNames));
+    children.push_back(Choice("radarType", game.radarType, config::kRadarTypeNames));
+    children.push_back(Choice("cameraPosition", game.cameraPosition, config::kCameraPositionNames));
+    children.push_back(
+        Choice("guardCorrection", game.guardCorrection, config::kGuardCorrectionNames));
+    children.push_back(
+        Choice("arcadeDifficulty", game.arcadeDifficulty, config::kArcadeDifficultyNames));
     children.push_back(Number("captureEnabled", game.captureEnabled, OnOff(game.captureEnabled)));
-    children.push_back(Choice("captureSize", game.captureSize, dialog::kResolutionNames));
+    children.push_back(Choice("captureSize", game.captureSize, config::kResolutionNames));
     return group;
 }
 
@@ -161,7 +131,7 @@ Setting Network(const config::CSaveConfig& record)
     auto& children = group.children;
     children.push_back(Number("port", network.port));
     children.push_back(Number("useUpnp", network.useUpnp, OnOff(network.useUpnp)));
-    children.push_back(Choice("keyResponse", network.keyResponse, kKeyResponses));
+    children.push_back(Choice("keyResponse", network.keyResponse, config::kKeyResponseNames));
     children.push_back(Text("lobbyId", Utf8FromCp932(config::IdText(network.lobbyId))));
     children.push_back(Text("directId", Utf8FromCp932(config::IdText(network.directId))));
 

@@ -1,5 +1,6 @@
 // The Game page: game options, the three volumes and the game's choices.
 #include "app/config_application.h"
+#include "config/setting_names.h"
 #include "dialog/page_controls.h"
 #include "dialog/page_values.h"
 #include "resources/resource.h"
@@ -8,11 +9,6 @@
 
 namespace
 {
-const char* const kRadarTypes[] = {"固定", "回転"};
-const char* const kArcadeDifficulties[] = {"Easy", "Normal", "Hard", "Lunatic"};
-const char* const kGuardCorrections[] = {"OFF", "ON"};
-const char* const kCameraPositions[] = {"左", "右"};
-const char* const kLockOnTypes[] = {"距離優先", "キャラ正面優先", "カメラ正面優先", "順送り"};
 
 struct VolumeSlider
 {
@@ -47,12 +43,15 @@ bool CConfigApplication::InitGamePage()
         SendDlgItemMessageA(page, slider.id, TBM_SETPOS, TRUE, game->*slider.field);
     }
 
-    dialog::FillChoices(page, IDC_RADAR_TYPE, kRadarTypes, game->radarType);
-    dialog::FillChoices(page, IDC_ARCADE_DIFFICULTY, kArcadeDifficulties, game->arcadeDifficulty);
-    dialog::FillChoices(page, IDC_GUARD_CORRECTION, kGuardCorrections, game->guardCorrection);
-    dialog::FillChoices(page, IDC_LOCK_ON_TYPE, kLockOnTypes, game->lockOnType);
-    dialog::FillChoices(page, IDC_CAMERA_POSITION, kCameraPositions, game->cameraPosition);
-    dialog::FillChoices(page, IDC_CAPTURE_SIZE, dialog::kResolutionNames, game->captureSize);
+    dialog::FillChoices(page, IDC_RADAR_TYPE, config::kRadarTypeNames, game->radarType);
+    dialog::FillChoices(page, IDC_ARCADE_DIFFICULTY, config::kArcadeDifficultyNames,
+                        game->arcadeDifficulty);
+    dialog::FillChoices(page, IDC_GUARD_CORRECTION, config::kGuardCorrectionNames,
+                        game->guardCorrection);
+    dialog::FillChoices(page, IDC_LOCK_ON_TYPE, config::kLockOnTypeNames, game->lockOnType);
+    dialog::FillChoices(page, IDC_CAMERA_POSITION, config::kCameraPositionNames,
+                        game->cameraPosition);
+    dialog::FillChoices(page, IDC_CAPTURE_SIZE, config::kResolutionNames, game->captureSize);
     return true;
 }
 

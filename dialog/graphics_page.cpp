@@ -1,22 +1,22 @@
 // The Graphics page: screen size, HDR, trail quality, full screen and movies.
 #include "app/config_application.h"
+#include "config/setting_names.h"
 #include "dialog/page_controls.h"
 #include "dialog/page_values.h"
 #include "resources/resource.h"
 
 namespace
 {
-const char* const kHdrLevels[] = {"なし", "LEVEL1", "LEVEL2", "LEVEL3", "LEVEL4"};
-const char* const kTrailQualities[] = {"なし", "低", "中", "高", "最高"};
 } // namespace
 
 bool CConfigApplication::InitGraphicsPage()
 {
     const HWND page = pages_[kGraphicsPageIndex].window;
     const config::ConfigGraphics* graphics = record_->Graphics();
-    dialog::FillChoices(page, IDC_SCREEN_SIZE, dialog::kResolutionNames, graphics->screenSize);
-    dialog::FillChoices(page, IDC_HDR_LEVEL, kHdrLevels, graphics->hdrLevel);
-    dialog::FillChoices(page, IDC_TRAIL_QUALITY, kTrailQualities, graphics->trailQuality);
+    dialog::FillChoices(page, IDC_SCREEN_SIZE, config::kResolutionNames, graphics->screenSize);
+    dialog::FillChoices(page, IDC_HDR_LEVEL, config::kHdrLevelNames, graphics->hdrLevel);
+    dialog::FillChoices(page, IDC_TRAIL_QUALITY, config::kTrailQualityNames,
+                        graphics->trailQuality);
     dialog::ShowCheck(page, IDC_FULL_SCREEN, graphics->fullScreen != 0);
     dialog::ShowCheck(page, IDC_SHOW_MOVIE, graphics->showMovie != 0);
     return true;

@@ -1,6 +1,7 @@
 // The key-config page: its two sub-pages filled at start-up, and what they
 // share.
 #include "app/config_application.h"
+#include "config/setting_names.h"
 #include "dialog/key_pages.h"
 #include "resources/resource.h"
 
@@ -9,32 +10,6 @@ namespace dialog
 namespace
 {
 // By action number.
-const char* const kActionLabels[config::kActionCount] = {
-    "使用しない",
-    "使用しない",
-    "使用しない",
-    "使用しない",
-    "移動上",
-    "移動下",
-    "移動左",
-    "移動右",
-    "カメラ正面",
-    "使用しない",
-    "使用しない",
-    "使用しない",
-    "使用しない",
-    "使用しない",
-    "スライド/決定",
-    "ガード/キャンセル",
-    "射撃",
-    "近接攻撃",
-    "ロック変更",
-    "上昇",
-    "トリガー",
-    "下降",
-    "メニュー/スタート",
-    "命令変更",
-};
 } // namespace
 
 void ShowActions(HWND page, int firstLabel, int firstEdit,
@@ -42,7 +17,7 @@ void ShowActions(HWND page, int firstLabel, int firstEdit,
 {
     for (int action = 0; action < config::kActionCount; ++action)
     {
-        SetDlgItemTextA(page, firstLabel + action, kActionLabels[action]);
+        SetDlgItemTextA(page, firstLabel + action, config::kActionLabels[action]);
         // A settings file may hold any value; only the low byte names it.
         SetDlgItemTextA(page, firstEdit + action, name(static_cast<std::uint8_t>(codes[action])));
     }

@@ -4,6 +4,8 @@
 #include "app/config_application.h"
 #include "app/system.h"
 #include "config/ip_address.h"
+#include "config/setting_names.h"
+#include "dialog/page_controls.h"
 #include "resources/resource.h"
 
 #include <cstdio>
@@ -66,16 +68,6 @@ void AddLine(HWND page, int listBox, const std::string& line)
     SendDlgItemMessageA(page, listBox, LB_ADDSTRING, 0, reinterpret_cast<LPARAM>(line.c_str()));
 }
 
-std::uint32_t CheckedFlag(HWND page, int checkBox)
-{
-    return SendDlgItemMessageA(page, checkBox, BM_GETCHECK, 0, 0) == BST_CHECKED ? 1 : 0;
-}
-
-void SetChecked(HWND page, int checkBox, std::uint32_t flag)
-{
-    SendDlgItemMessageA(page, checkBox, BM_SETCHECK, flag != 0 ? BST_CHECKED : BST_UNCHECKED, 0);
-}
-
 // Stores an entered address and shows it. The lines of a list stand for the
 // record's entries in order, as the delete button assumes. A 接続 address
 // takes the first free slot, which can be the line of an all-zero address
@@ -129,13 +121,10 @@ void CConfigApplication::InitNetworkPage()
     std::snprintf(port, sizeof port, "%d", network.port);
     SetDlgItemTextA(page, IDC_NETWORK_PORT, port);
 
-    SetChecked(page, IDC_NETWORK_USE_UPNP, network.useUpnp);
-    SetChecked(page, IDC_NETWORK_PLAY_BGM, network.playBgm);
-
-    for (const char* choice : {"1", "2", "3", "4", "5"})
-        SendDlgItemMessageA(page, IDC_NETWORK_KEY_RESPONSE, CB_ADDSTRING, 0,
-                            reinterpret_cast<LPARAM>(choice));
-    SendDlgItemMessageA(page, IDC_NETWORK_KEY_RESPONSE, CB_SETCURSEL, network.keyResponse, 0);
+    dialog::ShowCheck(page, IDC_NETWORK_USE_UPNP, network.useUpnp != 0);
+    dialog::ShowCheck(page, IDC_NETWORK_PLAY_BGM, network.playBgm != 0);
+    dialog::FillChoices(page, IDC_NETWORK_KEY_RESPONSE, config::kKeyResponseNames,
+                        network.keyResponse);
 
     for (const config::IpEntry& slot : network.connectList)
     {
@@ -181,9 +170,9 @@ LRESULT CConfigApplication::OnNetworkPage(HWND page, UINT message, WPARAM wParam
     else if (code == BN_CLICKED)
     {
         if (control == IDC_NETWORK_USE_UPNP)
-            network.useUpnp = CheckedFlag(page, control);
+            network.useUpnp = dialog::CheckValue(page, control);
         else if (control == IDC_NETWORK_PLAY_BGM)
-            network.playBgm = CheckedFlag(page, control);
+            network.playBgm = dialog::CheckValue(page, control);
         else if (const AddressList* list = ListAddedBy(control))
         {
             if (DialogBoxParamA(system_->GetInstance(), MAKEINTRESOURCEA(IDD_IP_ENTRY),

@@ -12,12 +12,6 @@
 namespace dialog
 {
 
-// The screen-size and capture-size lists, by the index the record stores.
-inline constexpr const char* kResolutionNames[config::kResolutionCount] = {
-    "640×480",  "800×600",  "1024×768",  "1280×960", "1600×1200", "720×480",
-    "1024×600", "1280×720", "1920×1080", "1440×900", "1680×1050", "1920×1200",
-};
-
 // The volume sliders run from this level at their left end to 0 at their
 // right end, in hundredths of a decibel.
 inline constexpr std::int32_t kSliderMinimumVolume = -3000;
