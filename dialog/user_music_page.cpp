@@ -8,7 +8,9 @@
 #include "resources/resource.h"
 #include "tension/music_check.h"
 
+#include <optional>
 #include <shellapi.h>
+#include <string>
 
 namespace
 {

@@ -140,12 +140,3 @@ TEST_F(MusicCheckTest, NeitherFileIsHeldAfterTheCheck)
     for (const char* file : {"two-minutes.wav", "half-minute.wav", "named.txt", "unknown-key.txt"})
         EXPECT_TRUE(std::filesystem::remove(file)) << file;
 }
-
-TEST_F(MusicCheckTest, TheMessageMayBeLeftOut)
-{
-    EXPECT_EQ(CheckMusicRow("two-minutes.wav", "named.txt", nullptr), MusicCheckResult::Accepted);
-    EXPECT_EQ(CheckMusicRow("missing.wav", "named.txt", nullptr),
-              MusicCheckResult::MusicUnreadable);
-    EXPECT_EQ(CheckMusicRow("two-minutes.wav", "missing.txt", nullptr),
-              MusicCheckResult::TensionRejected);
-}
