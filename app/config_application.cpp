@@ -90,6 +90,7 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
     InitNetworkPage();
     InitKeyConfigPage();
     InitReplayPage();
+    InitUserMusicPage();
     InitRadioChatPage();
     return true;
 }

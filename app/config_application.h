@@ -26,6 +26,7 @@ inline constexpr int kKeyConfigPageIndex = 5;
 inline constexpr int kGraphicsPageIndex = 0;
 inline constexpr int kGamePageIndex = 1;
 inline constexpr int kReplayPageIndex = 3;
+inline constexpr int kUserMusicPageIndex = 4;
 inline constexpr int kRadioChatPageIndex = 6;
 inline constexpr int kKeyboardPageIndex = 0;
 inline constexpr int kPadPageIndex = 1;
@@ -73,6 +74,12 @@ public:
     // Replay page: saving replays and the lock of each of the thirty.
     bool InitReplayPage();
     LRESULT OnReplayPage(HWND page, UINT message, WPARAM wParam, LPARAM lParam);
+
+    // User music page (BGM): ten music and tension file paths, typed, browsed
+    // for or dropped onto the twenty subclassed edits, and checked.
+    bool InitUserMusicPage();
+    LRESULT OnUserMusicPage(HWND page, UINT message, WPARAM wParam, LPARAM lParam);
+    LRESULT OnUserMusicEdit(HWND edit, UINT message, WPARAM wParam, LPARAM lParam);
 
     // Radio-chat page: the twelve function-key messages and their receivers.
     bool InitRadioChatPage();

@@ -24,7 +24,7 @@ const PageEntry kPages[kPageCount] = {
     {"ゲーム", IDD_GAME_PAGE, &CConfigApplication::OnGamePage},
     {"ネットワーク", IDD_NETWORK_PAGE, &CConfigApplication::OnNetworkPage},
     {"リプレイ", IDD_REPLAY_PAGE, &CConfigApplication::OnReplayPage},
-    {"BGM", IDD_USER_MUSIC_PAGE, nullptr},
+    {"BGM", IDD_USER_MUSIC_PAGE, &CConfigApplication::OnUserMusicPage},
     {"キーコンフィグ", IDD_KEY_CONFIG_PAGE, nullptr},
     {"ラジオチャット", IDD_RADIO_CHAT_PAGE, &CConfigApplication::OnRadioChatPage},
 };
@@ -203,6 +203,11 @@ LRESULT CConfigApplication::WindowProc(HWND window, UINT message, WPARAM wParam,
             continue;
         const PageHandler handler = kKeyPages[index].handler;
         return handler != nullptr ? (this->*handler)(window, message, wParam, lParam) : FALSE;
+    }
+    for (int row = 0; row < config::kUserBgmRowCount; ++row)
+    {
+        if (window == musicEdits_[row].window || window == tensionEdits_[row].window)
+            return OnUserMusicEdit(window, message, wParam, lParam);
     }
     return OnMainDialog(window, message, wParam, lParam);
 }

@@ -91,3 +91,13 @@
 #define IDC_PAD_RESET 4290
 #define IDC_PAD_PLAYER 4291
 #define IDC_PAD_PLAYER_LABEL 4292
+
+// User music page: row r (0 to 9) has its music path edit at
+// IDC_MUSIC_PATH_FIRST, its tension path edit at IDC_TENSION_PATH_FIRST, its
+// 参照 button at IDC_MUSIC_BROWSE_FIRST and its チェック button at
+// IDC_MUSIC_CHECK_FIRST, each plus IDC_MUSIC_ROW_STEP * r.
+#define IDC_MUSIC_PATH_FIRST 7001
+#define IDC_TENSION_PATH_FIRST 7002
+#define IDC_MUSIC_BROWSE_FIRST 7003
+#define IDC_MUSIC_CHECK_FIRST 7004
+#define IDC_MUSIC_ROW_STEP 4

@@ -1,0 +1,165 @@
+// The user music page (BGM): ten pieces of the user's own music, each with
+// its tension file. Paths are typed, browsed for or dropped from the shell,
+// and every change goes straight into the record; チェック tries a row the
+// way the game will load it.
+#include "app/config_application.h"
+#include "app/system.h"
+#include "dialog/user_music_values.h"
+#include "resources/resource.h"
+#include "tension/music_check.h"
+
+#include <optional>
+#include <shellapi.h>
+#include <string>
+
+namespace
+{
+
+// Description and pattern pairs; the literal's own zero ends the list.
+constexpr char kMusicFilter[] = "すべての対応ファイル\0*.wav;*.ogg\0すべてのファイル(*.*)\0*.*\0";
+constexpr char kTensionFilter[] = "すべての対応ファイル\0*.txt\0すべてのファイル(*.*)\0*.*\0";
+
+// Sends the edit's messages through `procedure` from now on and shows the
+// path; the edit takes files dropped from the shell.
+void Subclass(SubclassedEdit& edit, HWND page, int id, WNDPROC procedure, const std::string& path)
+{
+    edit.controlId = id;
+    edit.window = GetDlgItem(page, id);
+    if (edit.window == nullptr)
+        return;
+    // Kept before the new procedure is in place: the first message it sees
+    // is passed on to this one.
+    edit.previousProcedure =
+        reinterpret_cast<WNDPROC>(GetWindowLongPtrA(edit.window, GWLP_WNDPROC));
+    SetWindowLongPtrA(edit.window, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(procedure));
+    SetWindowTextA(edit.window, path.c_str());
+    DragAcceptFiles(edit.window, TRUE);
+}
+
+// The first file of a drop goes into the field and the edit; any further
+// ones are ignored. A drop without a file leaves both as they were.
+void TakeDroppedFile(HDROP drop, HWND edit, char (&field)[config::kPathCapacity])
+{
+    char path[config::kPathCapacity] = {};
+    if (DragQueryFileA(drop, 0, path, sizeof path) != 0)
+    {
+        dialog::StorePath(field, path);
+        SetWindowTextA(edit, path);
+    }
+    DragFinish(drop);
+}
+
+void StoreEditText(HWND edit, char (&field)[config::kPathCapacity])
+{
+    char text[config::kPathCapacity] = {};
+    GetWindowTextA(edit, text, sizeof text);
+    dialog::StorePath(field, text);
+}
+
+// The music file, then at once its tension file. The main dialog stays
+// disabled across both dialogs, so that nothing else of the tool can be
+// used between them; a cancel keeps what was chosen before it.
+void BrowseRow(CSystem& system, config::UserBgmRow& paths, HWND musicEdit, HWND tensionEdit)
+{
+    const HWND mainDialog = system.GetHwnd();
+    EnableWindow(mainDialog, FALSE);
+    char music[config::kPathCapacity] = {};
+    if (!system.OpenFileDialog(music, "BGMファイルを開く", kMusicFilter, "wav"))
+    {
+        EnableWindow(mainDialog, TRUE);
+        return;
+    }
+    dialog::StorePath(paths.musicPath, music);
+    SetWindowTextA(musicEdit, music);
+
+    char tensionFile[config::kPathCapacity] = {};
+    const bool chosen =
+        system.OpenFileDialog(tensionFile, "テンションファイルを開く", kTensionFilter, "txt");
+    EnableWindow(mainDialog, TRUE);
+    if (!chosen)
+        return;
+    dialog::StorePath(paths.tensionPath, tensionFile);
+    SetWindowTextA(tensionEdit, tensionFile);
+}
+
+// Shows the outcome in a plain box; the record is only read.
+bool CheckRow(const config::UserBgmRow& paths)
+{
+    tension::CTextString message;
+    const tension::MusicCheckResult result =
+        tension::CheckMusicRow(dialog::PathText(paths.musicPath).c_str(),
+                               dialog::PathText(paths.tensionPath).c_str(), &message);
+    MessageBoxA(nullptr, message.CStr(), "", MB_OK);
+    return result == tension::MusicCheckResult::Accepted;
+}
+
+} // namespace
+
+bool CConfigApplication::InitUserMusicPage()
+{
+    const HWND page = pages_[kUserMusicPageIndex].window;
+    const config::ConfigUserBgm* music = record_->UserBgm();
+    for (int row = 0; row < config::kUserBgmRowCount; ++row)
+    {
+        const int step = IDC_MUSIC_ROW_STEP * row;
+        Subclass(musicEdits_[row], page, IDC_MUSIC_PATH_FIRST + step, procedure_,
+                 dialog::PathText(music->rows[row].musicPath));
+        Subclass(tensionEdits_[row], page, IDC_TENSION_PATH_FIRST + step, procedure_,
+                 dialog::PathText(music->rows[row].tensionPath));
+    }
+    return true;
+}
+
+LRESULT CConfigApplication::OnUserMusicEdit(HWND edit, UINT message, WPARAM wParam, LPARAM lParam)
+{
+    config::ConfigUserBgm* music = record_->UserBgm();
+    for (int row = 0; row < config::kUserBgmRowCount; ++row)
+    {
+        const bool isMusic = edit == musicEdits_[row].window;
+        if (!isMusic && edit != tensionEdits_[row].window)
+            continue;
+        if (message != WM_DROPFILES)
+        {
+            const SubclassedEdit& entry = isMusic ? musicEdits_[row] : tensionEdits_[row];
+            return CallWindowProcA(entry.previousProcedure, edit, message, wParam, lParam);
+        }
+        config::UserBgmRow& paths = music->rows[row];
+        TakeDroppedFile(reinterpret_cast<HDROP>(wParam), edit,
+                        isMusic ? paths.musicPath : paths.tensionPath);
+        return 0;
+    }
+    return 0;
+}
+
+LRESULT CConfigApplication::OnUserMusicPage(HWND page, UINT message, WPARAM wParam, LPARAM)
+{
+    if (message != WM_COMMAND)
+        return FALSE;
+    const int id = LOWORD(wParam);
+    const std::optional<dialog::MusicControl> control = dialog::MusicControlOf(id);
+    if (!control)
+        return TRUE;
+    const int row = control->row;
+    config::UserBgmRow& paths = record_->UserBgm()->rows[row];
+    const UINT code = HIWORD(wParam);
+    switch (control->column)
+    {
+    case dialog::MusicColumn::MusicPath:
+        if (code == EN_UPDATE)
+            StoreEditText(GetDlgItem(page, id), paths.musicPath);
+        return TRUE;
+    case dialog::MusicColumn::TensionPath:
+        if (code == EN_UPDATE)
+            StoreEditText(GetDlgItem(page, id), paths.tensionPath);
+        return TRUE;
+    case dialog::MusicColumn::Browse:
+        if (code == BN_CLICKED)
+            BrowseRow(*system_, paths, musicEdits_[row].window, tensionEdits_[row].window);
+        return TRUE;
+    case dialog::MusicColumn::Check:
+        if (code != BN_CLICKED)
+            return TRUE;
+        return CheckRow(paths) ? TRUE : FALSE;
+    }
+    return TRUE;
+}
