@@ -221,18 +221,3 @@ TEST(GamePage, SavingWritesWhatTheControlsSet)
     };
     EXPECT_EQ(section, expected);
 }
-
-TEST(GamePage, ControlsAreOfTheirKinds)
-{
-    RunningTool tool;
-    const HWND page = tool.Page(kGamePageIndex);
-    for (const Control& check : kChecks)
-        EXPECT_TRUE(gui::IsCheckBox(tool.Control(page, check.id))) << check.id;
-    for (const Choice& choice : kChoices)
-        EXPECT_TRUE(gui::IsDropDownList(tool.Control(page, choice.id))) << choice.id;
-    EXPECT_TRUE(gui::ListScrolls(tool.Control(page, IDC_CAPTURE_SIZE)));
-    for (int id : kSliders)
-        EXPECT_TRUE(gui::IsControl(tool.Control(page, id), TRACKBAR_CLASSA, TBS_BOTH | TBS_NOTICKS,
-                                   TBS_VERT))
-            << id;
-}

@@ -112,14 +112,3 @@ TEST(GraphicsPage, SavingWritesWhatTheControlsSet)
                                                 0,  0, 2, 0, 0, 0, 0, 0, 0, 0};
     EXPECT_EQ(section, expected);
 }
-
-TEST(GraphicsPage, ControlsAreOfTheirKinds)
-{
-    RunningTool tool;
-    const HWND page = tool.Page(kGraphicsPageIndex);
-    for (const Choice& choice : kChoices)
-        EXPECT_TRUE(gui::IsDropDownList(tool.Control(page, choice.id))) << choice.id;
-    EXPECT_TRUE(gui::ListScrolls(tool.Control(page, IDC_SCREEN_SIZE)));
-    for (const Check& check : kChecks)
-        EXPECT_TRUE(gui::IsCheckBox(tool.Control(page, check.id))) << check.id;
-}

@@ -142,23 +142,3 @@ TEST(RadioChatPage, SavingWritesWhatTheRowsSet)
     const std::vector<std::uint8_t> expected = {1, 0x91, 0xDE, 0x94, 0xF0, 0};
     EXPECT_EQ(std::vector<std::uint8_t>(entry, entry + expected.size()), expected);
 }
-
-TEST(RadioChatPage, RowsLieEighteenUnitsApart)
-{
-    RunningTool tool;
-    const HWND page = tool.Page(kRadioChatPageIndex);
-    EXPECT_TRUE(gui::LiesAt(page, gui::FindStatic(page, "メッセージ"), {22, 8, 40, 8}));
-    EXPECT_TRUE(gui::LiesAt(page, gui::FindStatic(page, "送信先"), {202, 9, 30, 8}));
-    for (int row = 0; row < config::kRadioChatCount; ++row)
-    {
-        const HWND label = gui::FindStatic(page, "F" + std::to_string(row + 1));
-        const HWND edit = tool.Control(page, TextEdit(row));
-        const HWND box = tool.Control(page, ToAllBox(row));
-        EXPECT_TRUE(gui::LiesAt(page, label, {3, 24 + 18 * row, 16, 8})) << row;
-        EXPECT_TRUE(gui::LiesAt(page, edit, {21, 21 + 18 * row, 177, 14})) << row;
-        EXPECT_TRUE(gui::LiesAt(page, box, {202, 23 + 18 * row, 30, 10})) << row;
-        EXPECT_TRUE(gui::IsControl(edit, "Edit", ES_AUTOHSCROLL, ES_MULTILINE)) << row;
-        EXPECT_TRUE(gui::IsCheckBox(box)) << row;
-        EXPECT_EQ(gui::WindowText(box), "全体") << row;
-    }
-}

@@ -85,23 +85,3 @@ TEST(ReplayPage, SavingWritesWhatTheBoxesSet)
                                         file.begin() + gui::kReplayInFile + 124),
               expected);
 }
-
-TEST(ReplayPage, RowsLieInTwoColumnsOfFifteen)
-{
-    RunningTool tool;
-    const HWND page = tool.Page(kReplayPageIndex);
-    EXPECT_TRUE(gui::LiesAt(page, tool.Control(page, IDC_SAVE_REPLAYS), {5, 4, 65, 10}));
-    EXPECT_TRUE(gui::IsCheckBox(tool.Control(page, IDC_SAVE_REPLAYS)));
-    EXPECT_EQ(gui::WindowText(tool.Control(page, IDC_SAVE_REPLAYS)), "リプレイを保存する");
-    for (int replay = 1; replay <= config::kReplayCount; ++replay)
-    {
-        const bool left = replay <= 15;
-        const int row = left ? replay - 1 : replay - 16;
-        const HWND label = gui::FindStatic(page, "リプレイ" + std::to_string(replay));
-        const HWND box = tool.Control(page, LockBox(replay));
-        EXPECT_TRUE(gui::LiesAt(page, label, {left ? 3 : 118, 23 + 13 * row, 31, 8})) << replay;
-        EXPECT_TRUE(gui::LiesAt(page, box, {left ? 35 : 159, 22 + 13 * row, 30, 10})) << replay;
-        EXPECT_TRUE(gui::IsCheckBox(box)) << replay;
-        EXPECT_EQ(gui::WindowText(box), "ロック") << replay;
-    }
-}

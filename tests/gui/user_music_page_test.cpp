@@ -256,30 +256,6 @@ protected:
 
 } // namespace
 
-TEST(UserMusicPage, HoldsTenRowsOfTwoPathEditsAndTwoButtons)
-{
-    RunningTool tool;
-    const HWND page = MusicPage(tool);
-    EXPECT_TRUE(gui::LiesAt(page, gui::FindStatic(page, "BGM"), {4, 6, 40, 8}));
-    EXPECT_TRUE(gui::LiesAt(page, gui::FindStatic(page, "テンション"), {84, 6, 40, 8}));
-    for (int row = 0; row < config::kUserBgmRowCount; ++row)
-    {
-        const int y = 20 + 22 * row;
-        for (const int id : {MusicEdit(row), TensionEdit(row)})
-            EXPECT_TRUE(gui::IsControl(tool.Control(page, id), "Edit", ES_AUTOHSCROLL)) << id;
-        EXPECT_TRUE(gui::LiesAt(page, tool.Control(page, MusicEdit(row)), {4, y, 80, 14})) << row;
-        EXPECT_TRUE(gui::LiesAt(page, tool.Control(page, TensionEdit(row)), {84, y, 80, 14}))
-            << row;
-        EXPECT_TRUE(gui::LiesAt(page, tool.Control(page, BrowseButton(row)), {168, y, 30, 14}))
-            << row;
-        EXPECT_TRUE(gui::LiesAt(page, tool.Control(page, CheckButton(row)), {202, y, 30, 14}))
-            << row;
-        EXPECT_EQ(WindowText(tool.Control(page, BrowseButton(row))), "参照");
-        EXPECT_EQ(WindowText(tool.Control(page, CheckButton(row))), "チェック");
-    }
-    EXPECT_EQ(CheckButton(9), 7040);
-}
-
 TEST(UserMusicPage, ShowsTheRecordsPathsInTheirSubclassedEdits)
 {
     // A path of 260 bytes without its zero, as a damaged file may hold.
