@@ -5,6 +5,7 @@
 #include "config/ip_address.h"
 #include "resources/resource.h"
 #include "tests/gui/gui_harness.h"
+#include "tests/gui/page_checks.h"
 
 #include <array>
 #include <cstring>
@@ -225,17 +226,10 @@ TEST(NetworkPage, StartFillsEveryControlFromTheFileAndChangesNothing)
     EXPECT_EQ(gui::WindowText(tool.Control(page, IDC_NETWORK_DIRECT_ID)), "direct");
     EXPECT_EQ(IsDlgButtonChecked(page, IDC_NETWORK_USE_UPNP), BST_CHECKED);
     EXPECT_EQ(IsDlgButtonChecked(page, IDC_NETWORK_PLAY_BGM), BST_UNCHECKED);
-    std::vector<std::string> choices;
-    for (int index = 0;
-         index < SendDlgItemMessageA(page, IDC_NETWORK_KEY_RESPONSE, CB_GETCOUNT, 0, 0); ++index)
-    {
-        char choice[8] = {};
-        SendDlgItemMessageA(page, IDC_NETWORK_KEY_RESPONSE, CB_GETLBTEXT, index,
-                            reinterpret_cast<LPARAM>(choice));
-        choices.push_back(choice);
-    }
-    EXPECT_EQ(choices, (std::vector<std::string>{"1", "2", "3", "4", "5"}));
-    EXPECT_EQ(SendDlgItemMessageA(page, IDC_NETWORK_KEY_RESPONSE, CB_GETCURSEL, 0, 0), 3);
+    ASSERT_EQ(gui::ItemCount(page, IDC_NETWORK_KEY_RESPONSE), 5);
+    for (int index = 0; index < 5; ++index)
+        EXPECT_EQ(gui::ItemText(page, IDC_NETWORK_KEY_RESPONSE, index), std::to_string(index + 1));
+    EXPECT_EQ(gui::Selection(page, IDC_NETWORK_KEY_RESPONSE), 3);
     EXPECT_EQ(Lines(page, IDC_CONNECT_LIST),
               (std::vector<std::string>{"192.168.0.1", "10.0.0.255"}));
     EXPECT_EQ(Lines(page, IDC_ALLOW_LIST), (std::vector<std::string>{"010.*.*.001"}));
