@@ -60,17 +60,6 @@ TEST(TabPages, AnIndexOutOfRangeHidesEveryPageAndKeepsTheCurrentOne)
         EXPECT_FALSE(IsWindowVisible(tool.Page(index)));
 }
 
-TEST(MainDialog, SaveWritesTheRecordAsItStandsAndAsksToClose)
-{
-    RunningTool tool;
-    tool.Record().Graphics()->screenSize = 8;
-    const std::vector<gui::MessageBoxSeen> seen = tool.Save(IDNO);
-    ASSERT_EQ(seen.size(), 1u);
-    EXPECT_EQ(seen[0].text, "保存されました\nコンフィグツールを閉じますか？");
-    EXPECT_EQ(gui::ReadFile(tool.SettingsFile())[8], 8);
-    EXPECT_TRUE(IsWindow(tool.MainDialog()));
-}
-
 namespace
 {
 // Every visible control of `page` must lie inside the visible part of `clip`.
