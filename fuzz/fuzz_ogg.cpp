@@ -6,8 +6,8 @@
 // The mutator repairs page checksums after most mutations (see ogg_pages.h);
 // one in four keeps them as they come, so that bad checksums are tried too.
 #include "fuzz/fuzz_support.h"
-#include "fuzz/ogg_pages.h"
 #include "sound/ogg_decoder.h"
+#include "tests/support/ogg_pages.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -21,7 +21,7 @@ extern "C" std::size_t LLVMFuzzerCustomMutator(std::uint8_t* data, std::size_t s
 {
     size = LLVMFuzzerMutate(data, size, maxSize);
     if (seed % 4 != 0)
-        fuzzing::RepairOggChecksums(data, size);
+        testing_support::RepairOggChecksums(data, size);
     return size;
 }
 

@@ -6,8 +6,8 @@
 // Usage: make_fuzz_corpus <corpus folder>   (the folder's old seeds are replaced)
 #include "config/save_config.h"
 #include "fuzz/fuzz_tension.h"
-#include "fuzz/ogg_pages.h"
 #include "tests/support/audio_fixtures.h"
+#include "tests/support/ogg_pages.h"
 
 #include <cmath>
 #include <cstdio>
@@ -221,7 +221,7 @@ void MakeOgg(const fs::path& root)
     const std::size_t sequence =
         hole.size() - testing_support::SplitOggPages(stereoStream).back().size() + 18;
     ++hole[sequence];
-    fuzzing::RepairOggChecksums(hole.data(), hole.size());
+    testing_support::RepairOggChecksums(hole.data(), hole.size());
     corpus.Add("hole", hole);
 
     // Two streams one after the other: a chained file, mono then stereo.
@@ -237,7 +237,7 @@ void MakeOgg(const fs::path& root)
     constexpr std::uint64_t kClaimed = 200000;
     for (int i = 0; i < 8; ++i)
         claims[granule + i] = static_cast<std::uint8_t>(kClaimed >> (8 * i));
-    fuzzing::RepairOggChecksums(claims.data(), claims.size());
+    testing_support::RepairOggChecksums(claims.data(), claims.size());
     corpus.Add("claims-more-samples", claims);
 }
 

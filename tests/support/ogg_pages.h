@@ -1,12 +1,13 @@
 #pragma once
 
-// Ogg pages carry a checksum over their bytes; a mutated page whose checksum
-// no longer matches is dropped by the decoder before anything else looks at
-// it. Repairing the checksums lets the mutations reach the packets.
+// Ogg pages carry a checksum over their bytes, and a page whose checksum does
+// not match is dropped before anything else looks at it. A test that changes
+// a field of a page, and the fuzz mutator, repair the checksums afterwards so
+// that the change reaches the decoder.
 #include <cstddef>
 #include <cstdint>
 
-namespace fuzzing
+namespace testing_support
 {
 
 // The checksum of Ogg pages: CRC-32 with the polynomial 0x04C11DB7, not
@@ -18,4 +19,4 @@ std::uint32_t OggPageChecksum(const std::uint8_t* page, std::size_t size);
 // does. Returns the number of pages repaired.
 std::size_t RepairOggChecksums(std::uint8_t* data, std::size_t size);
 
-} // namespace fuzzing
+} // namespace testing_support

@@ -1,8 +1,8 @@
-#include "fuzz/ogg_pages.h"
+#include "tests/support/ogg_pages.h"
 
 #include <cstring>
 
-namespace fuzzing
+namespace testing_support
 {
 namespace
 {
@@ -60,4 +60,4 @@ std::size_t RepairOggChecksums(std::uint8_t* data, std::size_t size)
     return repaired;
 }
 
-} // namespace fuzzing
+} // namespace testing_support
