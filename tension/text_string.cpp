@@ -43,6 +43,7 @@ bool CTextString::Assign(const char* text, std::size_t length)
     base::FreeBlock(data_);
     data_ = block;
     length_ = length;
+    capacity_ = length;
     return true;
 }
 
@@ -53,16 +54,29 @@ bool CTextString::Append(const char* text)
 
 bool CTextString::Append(const char* text, std::size_t length)
 {
-    char* block = static_cast<char*>(base::AllocateZeroed(length_ + length + 1));
-    if (block == nullptr)
-        return false;
-    if (length_ != 0)
-        std::memcpy(block, data_, length_);
-    if (length != 0)
-        std::memcpy(block + length_, text, length);
-    base::FreeBlock(data_);
-    data_ = block;
-    length_ += length;
+    const std::size_t needed = length_ + length;
+    if (needed > capacity_)
+    {
+        const std::size_t capacity = needed > 2 * capacity_ ? needed : 2 * capacity_;
+        char* block = static_cast<char*>(base::AllocateZeroed(capacity + 1));
+        if (block == nullptr)
+            return false;
+        if (length_ != 0)
+            std::memcpy(block, data_, length_);
+        // `text` may lie in the old block: it is freed only after the copy.
+        if (length != 0)
+            std::memcpy(block + length_, text, length);
+        base::FreeBlock(data_);
+        data_ = block;
+        capacity_ = capacity;
+    }
+    else if (length != 0)
+    {
+        std::memmove(data_ + length_, text, length);
+    }
+    length_ = needed;
+    if (data_ != nullptr)
+        data_[length_] = '\0';
     return true;
 }
 

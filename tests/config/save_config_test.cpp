@@ -2,8 +2,10 @@
 #include "base/memory.h"
 #include "config/save_config.h"
 
+#include <algorithm>
 #include <cstring>
 #include <gtest/gtest.h>
+#include <vector>
 
 using config::CSaveConfig;
 using config::IpEntry;
@@ -378,4 +380,101 @@ TEST(SaveConfigObject, ResetsTouchOnlyTheirFields)
     EXPECT_EQ(record.Keys()->padConfigs[2].device, 2);
     EXPECT_EQ(record.Keys()->padConfigs[1].device, 3) << "other players keep their pad";
     EXPECT_FALSE(record.ResetPadButtons(4));
+}
+
+namespace
+{
+
+// A record with a value of its own in every section, to tell loaded
+// sections from defaults.
+CSaveConfig Marked()
+{
+    CSaveConfig record = Defaults();
+    record.Graphics()->screenSize = 7;
+    record.Game()->bgmVolume = -1234;
+    record.Network()->port = 1;
+    record.Replay()->replayLock[29] = 1;
+    record.UserBgm()->rows[9].tensionPath[259] = 'x';
+    record.Keys()->padConfigs[3].device = 0;
+    record.RadioChat()->entries[11].text[39] = 'x';
+    return record;
+}
+
+// Which sections of `record` hold the marks of Marked(), in file order.
+std::vector<bool> MarkedSections(CSaveConfig& record)
+{
+    return {record.Graphics()->screenSize == 7,
+            record.Game()->bgmVolume == -1234,
+            record.Network()->port == 1,
+            record.Replay()->replayLock[29] == 1,
+            record.UserBgm()->rows[9].tensionPath[259] == 'x',
+            record.Keys()->padConfigs[3].device == 0,
+            record.RadioChat()->entries[11].text[39] == 'x'};
+}
+
+} // namespace
+
+// A file cut at a section's length word, inside it or right after it keeps
+// every section before and the defaults of that one and every later one.
+TEST(SaveConfigImage, ACutAtEverySectionBoundaryKeepsTheSectionsBeforeIt)
+{
+    const std::vector<std::uint8_t> image = Marked().SaveToBytes();
+    const std::size_t lengthWords[] = {4, 28, 72, 548, 676, 5880, 6380};
+    for (std::size_t section = 0; section < 7; ++section)
+    {
+        for (const std::size_t cut :
+             {lengthWords[section], lengthWords[section] + 2, lengthWords[section] + 4})
+        {
+            CSaveConfig loaded;
+            ASSERT_TRUE(Load(loaded, std::vector<std::uint8_t>(image.begin(), image.begin() + cut)))
+                << cut;
+            std::vector<bool> expected(7, false);
+            std::fill(expected.begin(), expected.begin() + static_cast<long>(section), true);
+            EXPECT_EQ(MarkedSections(loaded), expected) << "cut at " << cut;
+        }
+    }
+    CSaveConfig whole;
+    ASSERT_TRUE(Load(whole, image));
+    EXPECT_EQ(MarkedSections(whole), std::vector<bool>(7, true));
+}
+
+TEST(SaveConfigImage, HugeAndEmptySectionLengthsNeverReadPastTheFile)
+{
+    const std::vector<std::uint8_t> image = Marked().SaveToBytes();
+    auto withLength = [&image](std::size_t offset, std::uint32_t length)
+    {
+        std::vector<std::uint8_t> changed = image;
+        std::memcpy(changed.data() + offset, &length, 4);
+        return changed;
+    };
+    struct Case
+    {
+        const char* what;
+        std::vector<std::uint8_t> file;
+        std::vector<bool> marked;
+    };
+    const Case cases[] = {
+        {"graphics claiming 4 GiB - 1: the rest of the file is its excess",
+         withLength(4, 0xFFFFFFFF),
+         {true, false, false, false, false, false, false}},
+        {"user music claiming 4 GiB - 1",
+         withLength(676, 0xFFFFFFFF),
+         {true, true, true, true, true, false, false}},
+        {"radio chat claiming 4 GiB - 1",
+         withLength(6380, 0xFFFFFFFF),
+         {true, true, true, true, true, true, true}},
+    };
+    for (const Case& c : cases)
+    {
+        CSaveConfig loaded;
+        ASSERT_TRUE(Load(loaded, c.file)) << c.what;
+        EXPECT_EQ(MarkedSections(loaded), c.marked) << c.what;
+    }
+
+    Image empty;
+    empty.U32(0x13001000).U32(0).Section(40, 0x02);
+    CSaveConfig loaded;
+    ASSERT_TRUE(Load(loaded, empty.bytes));
+    EXPECT_EQ(loaded.Graphics()->screenSize, 2) << "a section of length 0 keeps its defaults";
+    EXPECT_EQ(loaded.Game()->screenShake, 0x02020202u) << "and the next follows its length word";
 }

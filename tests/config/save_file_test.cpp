@@ -150,3 +150,37 @@ TEST(SaveFile, SaveIntoAnUnusableDirectoryFails)
     EXPECT_EQ(ReadBytes((folder.Root().Path() / "Tolvenik").string()),
               (std::vector<std::uint8_t>{1, 2, 3}));
 }
+
+// Windows refuses paths of MAX_PATH (260) bytes and more to a program that
+// does not opt in to long paths, and the file is written beside itself
+// first, under a name 4 bytes longer: on Windows none of these paths works.
+// POSIX takes them all. Either way the file is created whole with the
+// defaults, or start-up is refused with no settings file written, never one
+// under a cut path. (Wine creates the temporary file at any length but will
+// neither rename nor delete it beyond MAX_PATH, so one may be left there.)
+TEST(SaveFile, SettingsPathsOf259260And300BytesAreUsedWholeOrRefused)
+{
+    const std::string sep(1, base::PathSeparator());
+    const std::size_t fixed = 8 + 1 + 3 + 1 + 14; // "Tolvenik", "VEK", "GameConfig.dat"
+    for (const std::size_t length : {259u, 260u, 300u})
+    {
+        TempFolder root;
+        const std::string kept = testing_support::PathOfLength(root, length - fixed - 1, "");
+        ASSERT_FALSE(kept.empty()) << length;
+        std::error_code ignored;
+        fs::create_directory(kept, ignored);
+        const std::string file = kept + sep + "Tolvenik" + sep + "VEK" + sep + "GameConfig.dat";
+        ASSERT_EQ(file.size(), length);
+        ScopedEnvironment temp("TEMP", (kept + sep + "Temp").c_str());
+
+        CSaveConfig record;
+        const bool loaded = record.Load();
+        EXPECT_EQ(loaded, fs::exists(file)) << length;
+        if (!loaded)
+            continue;
+        EXPECT_EQ(ReadBytes(file).size(), 6876u) << length;
+        record.Graphics()->screenSize = 4;
+        ASSERT_TRUE(record.Save()) << length;
+        EXPECT_EQ(ReadBytes(file)[8], 4) << length;
+    }
+}

@@ -1,6 +1,7 @@
 // Complete decoding of Ogg Vorbis from memory through libvorbisfile.
 #include "sound/ogg_decoder.h"
 #include "tests/support/audio_fixtures.h"
+#include "tests/support/ogg_pages.h"
 
 #include <algorithm>
 #include <cstring>
@@ -192,4 +193,118 @@ TEST(OggDecoder, ATruncatedStreamDecodesWhatItHolds)
         EXPECT_EQ(audio.dataBytes, reference.pcm.size())
             << "the last page left sets the announced length";
     }
+}
+
+// A stream cut anywhere, at a page boundary or inside a page, decodes what
+// its whole pages hold, exactly as libvorbisfile delivers it, or is refused
+// as libvorbisfile refuses it; the block is never written past.
+TEST(OggDecoder, ACutAtEveryPageBoundaryOrInsideAPageDecodesWhatIsLeft)
+{
+    OggSpec spec;
+    spec.channels = 2;
+    spec.samplesPerChannel = 44100 * 3;
+    const Bytes stream = EncodeOggVorbis(spec);
+    std::vector<std::size_t> cuts;
+    std::size_t boundary = 0;
+    for (const Bytes& page : testing_support::SplitOggPages(stream))
+    {
+        cuts.push_back(boundary + page.size() / 2);
+        boundary += page.size();
+        cuts.push_back(boundary);
+    }
+    ASSERT_GT(cuts.size(), 8u);
+    for (const std::size_t cut : cuts)
+    {
+        const Bytes truncated(stream.begin(), stream.begin() + static_cast<long>(cut));
+        const Reference reference = DecodeDirectly(truncated);
+        DecodedAudio audio;
+        const bool decoded = DecodeOggVorbisFromMemory(truncated.data(), truncated.size(), &audio);
+        ASSERT_EQ(decoded, !reference.failed) << "cut at " << cut;
+        if (decoded)
+        {
+            ASSERT_LE(reference.pcm.size(), audio.dataBytes) << "cut at " << cut;
+            EXPECT_TRUE(std::equal(reference.pcm.begin(), reference.pcm.end(), audio.data))
+                << "cut at " << cut;
+        }
+    }
+}
+
+namespace
+{
+
+// The stream with the granule position of its last page set to `samples`.
+Bytes ClaimingSamples(const Bytes& stream, std::uint64_t samples)
+{
+    Bytes claimed = stream;
+    const std::size_t granule =
+        claimed.size() - testing_support::SplitOggPages(stream).back().size() + 6;
+    for (int i = 0; i < 8; ++i)
+        claimed[granule + i] = static_cast<std::uint8_t>(samples >> (8 * i));
+    testing_support::RepairOggChecksums(claimed.data(), claimed.size());
+    return claimed;
+}
+
+} // namespace
+
+// The last page's granule position announces the stream's length, and the
+// block is sized by it before a sample is decoded: more than a sound buffer
+// can hold is refused at once; less is silence after what the pages hold.
+// (The stream has several audio pages: with one, the claim would also move
+// the stream's start and cancel out.)
+TEST(OggDecoder, TheAnnouncedLengthSizesTheBlockUpToTheLargestSoundBuffer)
+{
+    OggSpec spec;
+    spec.channels = 1;
+    spec.samplesPerChannel = 44100 * 3;
+    const Bytes stream = EncodeOggVorbis(spec);
+    ASSERT_GE(testing_support::SplitOggPages(stream).size(), 4u) << "two of headers, two of audio";
+    const std::uint64_t largest = sound::kMaxBufferBytes / 2;
+    struct Case
+    {
+        const char* what;
+        std::uint64_t samples;
+        bool decodes;
+    };
+    const Case cases[] = {
+        {"ten times the samples held", spec.samplesPerChannel * 10, true},
+        {"as many as the largest sound buffer holds", largest, true},
+        {"one more than that", largest + 1, false},
+        {"the largest granule position", 0x7FFFFFFFFFFFFFFFull, false},
+    };
+    for (const Case& c : cases)
+    {
+        const Bytes claimed = ClaimingSamples(stream, c.samples);
+        DecodedAudio audio;
+        ASSERT_EQ(DecodeOggVorbisFromMemory(claimed.data(), claimed.size(), &audio), c.decodes)
+            << c.what;
+        if (!c.decodes)
+            continue;
+        EXPECT_EQ(audio.dataBytes, c.samples * 2) << c.what;
+        const std::size_t held = spec.samplesPerChannel * 2 + 8192;
+        EXPECT_TRUE(std::all_of(audio.data + held, audio.data + audio.dataBytes,
+                                [](std::uint8_t b) { return b == 0; }))
+            << c.what << ": what the pages do not hold is silence";
+    }
+}
+
+// A page whose checksum does not match is dropped as if it were missing.
+TEST(OggDecoder, APageWithABadChecksumIsPassedOverLikeAMissingOne)
+{
+    OggSpec spec;
+    spec.channels = 1;
+    spec.samplesPerChannel = 44100 * 12;
+    Bytes stream = EncodeOggVorbis(spec);
+    const std::vector<Bytes> pages = testing_support::SplitOggPages(stream);
+    ASSERT_GT(pages.size(), 6u);
+    std::size_t middle = 0;
+    for (std::size_t i = 0; i < pages.size() / 2; ++i)
+        middle += pages[i].size();
+    stream[middle + 22] ^= 0xFF;
+    const Reference reference = DecodeDirectly(stream);
+    ASSERT_FALSE(reference.failed);
+    DecodedAudio audio;
+    ASSERT_TRUE(DecodeOggVorbisFromMemory(stream.data(), stream.size(), &audio));
+    EXPECT_EQ(audio.dataBytes, 44100u * 12 * 2);
+    ASSERT_LT(reference.pcm.size(), audio.dataBytes) << "the page's samples are missing";
+    EXPECT_TRUE(std::equal(reference.pcm.begin(), reference.pcm.end(), audio.data));
 }

@@ -212,3 +212,98 @@ TEST(WaveLength, IsBytesOverChannelsRateAndBytesPerSample)
     format.bitsPerSample = 24;
     EXPECT_EQ(sound::ComputeLength(8000 * 3 * 5, format), 5.0f);
 }
+
+// Chunk sizes are the file's word against its length: a size that runs past
+// the RIFF chunk or the file hides what follows it, and the file is refused
+// unless what it needs lies before.
+TEST(RiffReader, ChunksThatLieAboutTheirSizeAreReadNoFurtherThanTheFile)
+{
+    const WaveSpec pcm = Pcm(100);
+    auto withRiffSize = [](Bytes file, std::uint32_t size)
+    {
+        std::memcpy(&file[4], &size, 4);
+        return file;
+    };
+    struct Case
+    {
+        const char* what;
+        Bytes file;
+        bool opens;
+    };
+    const Case cases[] = {
+        {"a chunk before fmt claiming 4 GiB",
+         RiffWriter()
+             .ChunkClaiming("LIST", 0xFFFFFFF0u, Body(8))
+             .Chunk("fmt ", FormatChunkBody(pcm))
+             .Chunk("data", Body(100))
+             .Finish(),
+         false},
+        {"a fmt chunk claiming 4 GiB",
+         RiffWriter()
+             .ChunkClaiming("fmt ", 0xFFFFFFFFu, FormatChunkBody(pcm))
+             .Chunk("data", Body(100))
+             .Finish(),
+         false},
+        {"a fmt chunk claiming 17 bytes",
+         RiffWriter()
+             .ChunkClaiming("fmt ", 17, FormatChunkBody(pcm))
+             .Chunk("data", Body(100))
+             .Finish(),
+         false},
+        {"a RIFF size that ends before the data chunk", withRiffSize(MakeWave(pcm), 4 + 8 + 16),
+         false},
+        {"a RIFF size of zero", withRiffSize(MakeWave(pcm), 0), false},
+        {"a RIFF size of 4 GiB - 1", withRiffSize(MakeWave(pcm), 0xFFFFFFFFu), true},
+        {"a data chunk claiming one byte more than the file holds",
+         RiffWriter()
+             .Chunk("fmt ", FormatChunkBody(pcm))
+             .ChunkClaiming("data", 101, Body(100))
+             .Finish(),
+         false},
+        {"a data chunk claiming fewer bytes than it has",
+         RiffWriter()
+             .Chunk("fmt ", FormatChunkBody(pcm))
+             .ChunkClaiming("data", 60, Body(100))
+             .Finish(),
+         true},
+    };
+    for (const Case& c : cases)
+    {
+        DecodedAudio audio;
+        EXPECT_EQ(ReadWaveFromMemory(c.file.data(), c.file.size(), &audio), c.opens) << c.what;
+        EXPECT_EQ(audio.data != nullptr, c.opens) << c.what;
+    }
+    DecodedAudio shorter;
+    const Bytes claimsFewer = RiffWriter()
+                                  .Chunk("fmt ", FormatChunkBody(pcm))
+                                  .ChunkClaiming("data", 60, Body(100))
+                                  .Finish();
+    ASSERT_TRUE(ReadWaveFromMemory(claimsFewer.data(), claimsFewer.size(), &shorter));
+    EXPECT_EQ(shorter.dataBytes, 60u) << "the data chunk's own size counts";
+}
+
+TEST(RiffReader, ACutAtEveryChunkBoundaryIsRefused)
+{
+    const Bytes file = MakeWave(Pcm(100)); // RIFF, WAVE, fmt (16), data (100)
+    struct Cut
+    {
+        const char* where;
+        std::size_t size;
+    };
+    const Cut cuts[] = {
+        {"inside the RIFF id", 2},      {"before the RIFF size", 4},
+        {"before the form type", 8},    {"before the fmt chunk", 12},
+        {"inside the fmt header", 16},  {"before the fmt fields", 20},
+        {"inside the fmt fields", 28},  {"before the data chunk", 36},
+        {"inside the data header", 40}, {"before the data", 44},
+        {"inside the data", 94},        {"before the last data byte", 143},
+    };
+    for (const Cut& cut : cuts)
+    {
+        DecodedAudio audio;
+        EXPECT_FALSE(ReadWaveFromMemory(file.data(), cut.size, &audio)) << cut.where;
+    }
+    DecodedAudio whole;
+    EXPECT_TRUE(ReadWaveFromMemory(file.data(), file.size(), &whole));
+    ASSERT_EQ(file.size(), 144u);
+}

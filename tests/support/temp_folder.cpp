@@ -1,5 +1,6 @@
 #include "tests/support/temp_folder.h"
 
+#include <algorithm>
 #include <atomic>
 #include <cstdlib>
 #include <fstream>
@@ -59,6 +60,31 @@ std::filesystem::path TempSaveFolder::SaveDirectory() const
 std::string TempSaveFolder::SettingsFile() const
 {
     return (SaveDirectory() / "GameConfig.dat").string();
+}
+
+std::string PathOfLength(const TempFolder& folder, std::size_t length, const std::string& ending)
+{
+    constexpr std::size_t kLongestPart = 200;
+    const std::string separator(1, std::filesystem::path::preferred_separator);
+    std::string path = folder.Path().string();
+    // Folders of at most kLongestPart bytes until the last part fits in one.
+    for (;;)
+    {
+        const std::size_t minimum = path.size() + separator.size() + ending.size();
+        if (minimum > length)
+            return "";
+        const std::size_t left = length - minimum;
+        if (left <= kLongestPart)
+        {
+            path += separator + std::string(left, 'f') + ending;
+            break;
+        }
+        const std::size_t part = std::min(kLongestPart, left - separator.size() - 1);
+        path += separator + std::string(part, 'd');
+    }
+    std::error_code error;
+    std::filesystem::create_directories(std::filesystem::path(path).parent_path(), error);
+    return error ? "" : path;
 }
 
 std::vector<std::uint8_t> ReadBytes(const std::string& path)

@@ -43,6 +43,12 @@ private:
     ScopedEnvironment temp_;
 };
 
+// A path inside `folder` of exactly `length` bytes that ends in `ending`,
+// with the folders before its last part created; empty when the folder's own
+// path leaves no room or the folders cannot be made (Windows itself refuses
+// folders of MAX_PATH bytes and more, Wine does not).
+std::string PathOfLength(const TempFolder& folder, std::size_t length, const std::string& ending);
+
 std::vector<std::uint8_t> ReadBytes(const std::string& path);
 void WriteBytes(const std::string& path, const std::vector<std::uint8_t>& bytes);
 

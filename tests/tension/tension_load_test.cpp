@@ -161,6 +161,59 @@ TEST_F(TensionLoadTest, AnUnrecognisedKeyAloneIsOnlyAWarning)
     EXPECT_EQ(result.log, Lines({"Time Data Not Tension!!"}));
 }
 
+// A file cut anywhere loads as the text it still holds; a zero byte ends the
+// text wherever it comes, whatever follows it.
+TEST_F(TensionLoadTest, AFileCutAnywhereOrHoldingAZeroLoadsAsTheTextBeforeIt)
+{
+    const std::string text = "ファイル名:曲;\nLOW:30;\nHI:60;\nLOW:90;\nCLIMAX:165;\nFINALE:170;\n";
+    for (std::size_t cut = 0; cut <= text.size(); ++cut)
+    {
+        const std::string before = text.substr(0, cut);
+        WriteText("cut.txt", before);
+        WriteText("zero.txt", before + std::string(1, '\0') + "NAME:" + text.substr(cut));
+        CTensionFile cutFile;
+        const Result cutResult = Load(cutFile, "cut.txt", 180.0);
+        CTensionFile zeroFile;
+        const Result zeroResult = Load(zeroFile, "zero.txt", 180.0);
+        EXPECT_EQ(zeroResult.loaded, cutResult.loaded) << "cut at " << cut;
+        EXPECT_EQ(zeroResult.log, cutResult.log) << "cut at " << cut;
+        EXPECT_EQ(zeroFile.GetTimeline()->GetKeyCount(), cutFile.GetTimeline()->GetKeyCount())
+            << "cut at " << cut;
+    }
+    CTensionFile whole;
+    EXPECT_TRUE(Load(whole, "cut.txt", 180.0).loaded);
+    EXPECT_STREQ(whole.GetName().CStr(), "曲");
+}
+
+// Windows refuses paths of MAX_PATH (260) bytes and more to a program that
+// does not opt in to long paths, the test's own writes included; POSIX and
+// Wine take them. Whatever the test could write loads as itself, and a path
+// that stands in for a missing name is too long for one.
+TEST_F(TensionLoadTest, PathsOf259260And300BytesLoadTheFileTheyName)
+{
+    for (const std::size_t length : {259u, 260u, 300u})
+    {
+        for (const bool named : {true, false})
+        {
+            const std::string path = testing_support::PathOfLength(folder_, length, ".txt");
+            if (!path.empty())
+                WriteText(path, named ? "NAME:long;\nLOW:30;\n" : "LOW:30;\n");
+            CTensionFile file;
+            const Result result = Load(file, path, 180.0);
+            const bool written = !path.empty() && std::filesystem::exists(path);
+            ASSERT_TRUE(written || length > 259) << "every platform takes 259 bytes";
+            if (!written)
+            {
+                EXPECT_EQ(result.log, Lines({kCannotOpen})) << length;
+                continue;
+            }
+            EXPECT_EQ(result.loaded, named) << length;
+            EXPECT_STREQ(file.GetName().CStr(), named ? "long" : path.c_str()) << length;
+            EXPECT_EQ(file.GetTimeline()->GetKeyCount(), 3u) << length;
+        }
+    }
+}
+
 // The message itself needs memory: when nothing more can be had, the load
 // fails without it.
 TEST_F(TensionLoadTest, AFailedTextBufferFailsTheLoad)

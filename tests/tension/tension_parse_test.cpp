@@ -438,6 +438,21 @@ TEST(TensionParse, KeysAndValuesOfAnyLengthNeverOverrunABuffer)
         << "cut before a character that does not fit whole";
 }
 
+// A long text picked by mistake (a program's source, a style sheet) logs a
+// warning for each of its pieces; the check must still end at once.
+TEST(TensionParse, AMessageForEachOfFortyThousandPiecesIsLoggedInLinearTime)
+{
+    constexpr std::size_t kPieces = 40000;
+    std::string text;
+    for (std::size_t i = 0; i < kPieces; ++i)
+        text += "a: b;";
+    const Outcome outcome = Parse("NAME:x;\n" + text, 200.0);
+    EXPECT_TRUE(outcome.accepted);
+    const std::string warning = std::string(kNotTension) + "\n";
+    ASSERT_EQ(outcome.log.size(), kPieces * warning.size());
+    EXPECT_EQ(outcome.log.substr(outcome.log.size() - warning.size()), warning);
+}
+
 TEST(TensionParse, TwoFinalesFailAfterTheChecksHaveSpoken)
 {
     const Outcome outcome = Parse("CF:150;\nCLIMAX:190;\nCF:160;\n", 200.0);

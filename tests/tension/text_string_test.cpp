@@ -3,6 +3,7 @@
 #include "tension/text_string.h"
 
 #include <gtest/gtest.h>
+#include <string>
 
 using tension::CTextString;
 
@@ -48,4 +49,32 @@ TEST(TextString, AFailedAllocationKeepsTheOldText)
     EXPECT_FALSE(text.Assign("lost"));
     EXPECT_STREQ(text.CStr(), "kept");
     EXPECT_EQ(text.Length(), 4u);
+}
+
+// A log gains a message per entry: its block must grow by doubling, or a
+// long text costs time in the square of its length.
+TEST(TextString, AppendingPieceByPieceNeedsFewAllocations)
+{
+    constexpr int kPieces = 100000;
+    const char piece[] = "Time Data Not Tension!!\n";
+    CTextString text;
+    base::ScopedAllocationFailure failure(40);
+    for (int i = 0; i < kPieces; ++i)
+        ASSERT_TRUE(text.Append(piece)) << "piece " << i;
+    ASSERT_EQ(text.Length(), kPieces * (sizeof piece - 1));
+    EXPECT_EQ(std::string(text.CStr() + text.Length() - (sizeof piece - 1)), piece);
+    EXPECT_EQ(text.CStr()[text.Length()], '\0');
+}
+
+TEST(TextString, AppendsItsOwnBytesAndAssignsAfterGrowing)
+{
+    CTextString text("abc");
+    ASSERT_TRUE(text.Append("defgh"));
+    ASSERT_TRUE(text.Append(text.CStr() + 1, 2)) << "from its own block, grown or not";
+    ASSERT_TRUE(text.Append(text.CStr(), 3));
+    EXPECT_STREQ(text.CStr(), "abcdefghbcabc");
+    ASSERT_TRUE(text.Assign("x"));
+    ASSERT_TRUE(text.Append("y"));
+    EXPECT_STREQ(text.CStr(), "xy");
+    EXPECT_EQ(text.Length(), 2u);
 }

@@ -1,0 +1,22 @@
+#pragma once
+
+// Ogg pages carry a checksum over their bytes, and a page whose checksum does
+// not match is dropped before anything else looks at it. A test that changes
+// a field of a page, and the fuzz mutator, repair the checksums afterwards so
+// that the change reaches the decoder.
+#include <cstddef>
+#include <cstdint>
+
+namespace testing_support
+{
+
+// The checksum of Ogg pages: CRC-32 with the polynomial 0x04C11DB7, not
+// reflected, starting from 0, over the page with its checksum field zero.
+std::uint32_t OggPageChecksum(const std::uint8_t* page, std::size_t size);
+
+// Rewrites the checksum of every complete page ("OggS", header, segment
+// table, body) found in `data`, skipping bytes between pages as the decoder
+// does. Returns the number of pages repaired.
+std::size_t RepairOggChecksums(std::uint8_t* data, std::size_t size);
+
+} // namespace testing_support
