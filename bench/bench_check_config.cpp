@@ -9,6 +9,7 @@
 // `oggdec -Q -o /dev/null` processes one after the other; the medians of the
 // rounds are compared. The last line is `ratio R`, R = vekcfg's time /
 // oggdec's time. Target: at most 1.15.
+#include "bench/bench_support.h"
 #include "config/save_config.h"
 #include "tests/support/audio_fixtures.h"
 
@@ -34,94 +35,11 @@ constexpr int kRows = 10;
 constexpr long kSampleRate = 44100;
 constexpr std::uint64_t kSeconds = 240;
 
-double Now()
-{
-    timespec now{};
-    clock_gettime(CLOCK_MONOTONIC, &now);
-    return double(now.tv_sec) + double(now.tv_nsec) * 1e-9;
-}
-
-struct Spawned
-{
-    int status = -1;
-    std::string output;
-};
-
-// Runs `arguments` to its end; its output is kept when `capture`, else
-// dropped.
-Spawned Run(const std::vector<std::string>& arguments, bool capture)
-{
-    std::vector<char*> argv;
-    for (const std::string& argument : arguments)
-        argv.push_back(const_cast<char*>(argument.c_str()));
-    argv.push_back(nullptr);
-    int channel[2] = {-1, -1};
-    posix_spawn_file_actions_t actions;
-    posix_spawn_file_actions_init(&actions);
-    if (capture && pipe(channel) == 0)
-    {
-        posix_spawn_file_actions_adddup2(&actions, channel[1], STDOUT_FILENO);
-        posix_spawn_file_actions_addclose(&actions, channel[0]);
-    }
-    else
-    {
-        posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, "/dev/null", O_WRONLY, 0);
-    }
-    posix_spawn_file_actions_addopen(&actions, STDERR_FILENO, "/dev/null", O_WRONLY, 0);
-    Spawned result;
-    pid_t child = 0;
-    if (posix_spawnp(&child, argv[0], &actions, nullptr, argv.data(), environ) == 0)
-    {
-        if (capture)
-        {
-            close(channel[1]);
-            char chunk[512];
-            for (ssize_t got; (got = read(channel[0], chunk, sizeof chunk)) > 0;)
-                result.output.append(chunk, std::size_t(got));
-            close(channel[0]);
-        }
-        waitpid(child, &result.status, 0);
-    }
-    posix_spawn_file_actions_destroy(&actions);
-    return result;
-}
-
-// Music-like input: the tests' tune over a soft noise bed with a burst on
-// every beat, so that the encoder spends bits as on real music.
-testing_support::SampleSource MusicSource()
-{
-    const testing_support::SampleSource tune = testing_support::TuneSource(kSampleRate);
-    return [tune](float** channels, int channelCount, int count, std::uint64_t first)
-    {
-        tune(channels, channelCount, count, first);
-        static std::uint32_t seed = 2024;
-        for (int i = 0; i < count; ++i)
-        {
-            const double beat =
-                double((first + std::uint64_t(i)) % (kSampleRate / 2)) / double(kSampleRate);
-            const double level = 0.06 + (beat < 0.08 ? 0.35 * (1.0 - beat / 0.08) : 0.0);
-            for (int c = 0; c < channelCount; ++c)
-            {
-                seed = seed * 1664525u + 1013904223u;
-                channels[c][i] +=
-                    static_cast<float>((double(seed >> 8) / double(1u << 24) * 2.0 - 1.0) * level);
-            }
-        }
-    };
-}
-
 bool WriteFile(const std::string& path, const void* data, std::size_t size)
 {
     std::FILE* out = std::fopen(path.c_str(), "wb");
     const bool written = out != nullptr && std::fwrite(data, 1, size, out) == size;
     return out != nullptr && std::fclose(out) == 0 && written;
-}
-
-double Median(std::vector<double> values)
-{
-    std::sort(values.begin(), values.end());
-    const std::size_t middle = values.size() / 2;
-    return values.size() % 2 != 0 ? values[middle] : (values[middle - 1] + values[middle]) / 2;
 }
 
 std::string BesideSelf(const char* name)
@@ -145,7 +63,7 @@ int main(int argc, char** argv)
                 "      Release build without sanitizers (see docs/performance.md)\n");
 #endif
     const std::string vekcfg = BesideSelf("vekcfg");
-    if (Run({"oggdec", "-Q", "--help"}, false).status != 0)
+    if (bench::Run({"oggdec", "-Q", "--help"}, false).status != 0)
     {
         std::fprintf(stderr, "oggdec is missing: apt-get install -y vorbis-tools\n");
         return 2;
@@ -164,9 +82,10 @@ int main(int argc, char** argv)
     spec.sampleRate = kSampleRate;
     spec.samplesPerChannel = kSeconds * kSampleRate;
     spec.quality = 0.3f;
-    const double encodeStart = Now();
-    const testing_support::Bytes ogg = testing_support::EncodeOggVorbis(spec, MusicSource());
-    const double encodeSeconds = Now() - encodeStart;
+    const double encodeStart = bench::Now();
+    const testing_support::Bytes ogg =
+        testing_support::EncodeOggVorbis(spec, bench::MusicSource(kSampleRate));
+    const double encodeSeconds = bench::Now() - encodeStart;
 
     // Limits for 240 s: Hi at most 48 s, Climax at most 24 s.
     const char tension[] = "FILENAME:Bench;\nLOW:30;\nHI:60;\nLOW:100;\nCLIMAX:220;\n"
@@ -204,20 +123,20 @@ int main(int argc, char** argv)
     std::vector<double> ours, theirs;
     for (int round = 0; round < rounds; ++round)
     {
-        double start = Now();
+        double start = bench::Now();
         for (const std::string& path : music)
         {
-            if (Run({"oggdec", "-Q", "-o", "/dev/null", path}, false).status != 0)
+            if (bench::Run({"oggdec", "-Q", "-o", "/dev/null", path}, false).status != 0)
             {
                 std::fprintf(stderr, "oggdec failed on %s\n", path.c_str());
                 return 1;
             }
         }
-        theirs.push_back(Now() - start);
+        theirs.push_back(bench::Now() - start);
 
-        start = Now();
-        const Spawned checked = Run({vekcfg, "check-config", settings}, true);
-        ours.push_back(Now() - start);
+        start = bench::Now();
+        const bench::Spawned checked = bench::Run({vekcfg, "check-config", settings}, true);
+        ours.push_back(bench::Now() - start);
         const long lines = std::count(checked.output.begin(), checked.output.end(), '\n');
         if (checked.status != 0 || lines != kRows)
         {
@@ -232,8 +151,8 @@ int main(int argc, char** argv)
         std::remove(path.c_str());
     rmdir(folder);
 
-    const double ourTime = Median(ours);
-    const double theirTime = Median(theirs);
+    const double ourTime = bench::Median(ours);
+    const double theirTime = bench::Median(theirs);
     const double ratio = ourTime / theirTime;
     std::printf("vekcfg check-config (10 rows), median of %d: %.3f s\n", rounds, ourTime);
     std::printf("10 sequential oggdec -Q -o /dev/null, median of %d: %.3f s\n", rounds, theirTime);

@@ -10,6 +10,7 @@
 // Peak memory is measured inside the decoding process: the growth of the
 // resident set's high-water mark (VmHWM) over the resident set before Open.
 // Target: ours within 1.10 x oggdec, peak at most file + 1.1 x PCM.
+#include "bench/bench_support.h"
 #include "sound/sound_buffer.h"
 #include "tests/support/audio_fixtures.h"
 
@@ -35,13 +36,6 @@ constexpr int kChannels = 2;
 constexpr std::uint64_t kSeconds = 480;
 constexpr float kQuality = 0.3f;
 
-double Now()
-{
-    timespec now{};
-    clock_gettime(CLOCK_MONOTONIC, &now);
-    return double(now.tv_sec) + double(now.tv_nsec) * 1e-9;
-}
-
 // A "kB" field of /proc/self/status, in bytes.
 long long StatusBytes(const char* field)
 {
@@ -65,94 +59,14 @@ int DecodeOnce(const char* path)
 {
     const long long before = StatusBytes("VmRSS");
     sound::CSoundBuffer buffer;
-    const double start = Now();
+    const double start = bench::Now();
     const bool opened = buffer.Open(path, 1, sound::kCapsStatic);
-    const double seconds = Now() - start;
+    const double seconds = bench::Now() - start;
     const long long peak = StatusBytes("VmHWM");
     if (!opened)
         return 1;
     std::printf("%.6f %lld %u\n", seconds, peak - before, buffer.GetInfo().dataBytes);
     return 0;
-}
-
-struct Spawned
-{
-    double seconds;
-    int status;
-    std::string output;
-};
-
-// Runs `argv` to its end; its output is kept when `capture`, else dropped.
-Spawned Run(const std::vector<std::string>& arguments, bool capture)
-{
-    std::vector<char*> argv;
-    for (const std::string& argument : arguments)
-        argv.push_back(const_cast<char*>(argument.c_str()));
-    argv.push_back(nullptr);
-    int channel[2] = {-1, -1};
-    posix_spawn_file_actions_t actions;
-    posix_spawn_file_actions_init(&actions);
-    if (capture && pipe(channel) == 0)
-    {
-        posix_spawn_file_actions_adddup2(&actions, channel[1], STDOUT_FILENO);
-        posix_spawn_file_actions_addclose(&actions, channel[0]);
-    }
-    else
-    {
-        posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, "/dev/null", O_WRONLY, 0);
-        posix_spawn_file_actions_addopen(&actions, STDERR_FILENO, "/dev/null", O_WRONLY, 0);
-    }
-    Spawned result{0.0, -1, {}};
-    const double start = Now();
-    pid_t child = 0;
-    if (posix_spawnp(&child, argv[0], &actions, nullptr, argv.data(), environ) == 0)
-    {
-        if (capture)
-        {
-            close(channel[1]);
-            char chunk[256];
-            for (ssize_t got; (got = read(channel[0], chunk, sizeof chunk)) > 0;)
-                result.output.append(chunk, std::size_t(got));
-            close(channel[0]);
-        }
-        waitpid(child, &result.status, 0);
-    }
-    result.seconds = Now() - start;
-    posix_spawn_file_actions_destroy(&actions);
-    return result;
-}
-
-// Music-like input: the tests' tune with a broadband layer (a soft noise
-// bed and a noise burst on every beat), so that the encoder spends bits as
-// it does on real music (about 110 kbit/s at quality 0.3) instead of
-// compressing bare tones to almost nothing.
-testing_support::SampleSource MusicSource()
-{
-    const testing_support::SampleSource tune = testing_support::TuneSource(kSampleRate);
-    return [tune](float** channels, int channelCount, int count, std::uint64_t first)
-    {
-        tune(channels, channelCount, count, first);
-        static std::uint32_t seed = 12345;
-        for (int i = 0; i < count; ++i)
-        {
-            const std::uint64_t n = first + std::uint64_t(i);
-            const double beat = double(n % (kSampleRate / 2)) / double(kSampleRate);
-            const double burst = beat < 0.08 ? 0.35 * (1.0 - beat / 0.08) : 0.0;
-            for (int c = 0; c < channelCount; ++c)
-            {
-                seed = seed * 1664525u + 1013904223u;
-                const double noise = double(seed >> 8) / double(1u << 24) * 2.0 - 1.0;
-                channels[c][i] += static_cast<float>(noise * (0.06 + burst));
-            }
-        }
-    };
-}
-
-double Median(std::vector<double> values)
-{
-    std::sort(values.begin(), values.end());
-    const std::size_t middle = values.size() / 2;
-    return values.size() % 2 != 0 ? values[middle] : (values[middle - 1] + values[middle]) / 2;
 }
 
 std::string SelfPath()
@@ -176,7 +90,7 @@ int main(int argc, char** argv)
     std::printf("note: this build has AddressSanitizer: its figures say little; measure a\n"
                 "      Release build without sanitizers (see docs/performance.md)\n");
 #endif
-    if (Run({"oggdec", "-Q", "--help"}, false).status != 0)
+    if (bench::Run({"oggdec", "-Q", "--help"}, false).status != 0)
     {
         std::fprintf(stderr, "oggdec is missing: apt-get install -y vorbis-tools\n");
         return 2;
@@ -191,8 +105,9 @@ int main(int argc, char** argv)
     spec.sampleRate = kSampleRate;
     spec.samplesPerChannel = kSeconds * kSampleRate;
     spec.quality = kQuality;
-    const double encodeStart = Now();
-    const testing_support::Bytes ogg = testing_support::EncodeOggVorbis(spec, MusicSource());
+    const double encodeStart = bench::Now();
+    const testing_support::Bytes ogg =
+        testing_support::EncodeOggVorbis(spec, bench::MusicSource(kSampleRate));
     std::FILE* out = std::fopen(path.c_str(), "wb");
     if (out == nullptr || std::fwrite(ogg.data(), 1, ogg.size(), out) != ogg.size() ||
         std::fclose(out) != 0)
@@ -204,14 +119,15 @@ int main(int argc, char** argv)
     std::printf("input: %llu s stereo %ld Hz Ogg Vorbis at quality %.1f, %zu bytes "
                 "(encoded in %.1f s); PCM %.0f bytes\n",
                 static_cast<unsigned long long>(kSeconds), kSampleRate, kQuality, ogg.size(),
-                Now() - encodeStart, pcmBytes);
+                bench::Now() - encodeStart, pcmBytes);
 
     const std::string self = SelfPath();
     std::vector<double> ours, opens, oggdec, peaks;
     for (int run = 0; run < runs; ++run)
     {
-        const Spawned reference = Run({"oggdec", "-Q", "-o", "/dev/null", path}, false);
-        const Spawned decoded = Run({self, "--decode", path}, true);
+        const bench::Spawned reference =
+            bench::Run({"oggdec", "-Q", "-o", "/dev/null", path}, false);
+        const bench::Spawned decoded = bench::Run({self, "--decode", path}, true);
         double openSeconds = 0;
         long long peak = 0;
         unsigned dataBytes = 0;
@@ -234,15 +150,15 @@ int main(int argc, char** argv)
     std::remove(path.c_str());
     rmdir(folder);
 
-    const double ourTime = Median(ours);
-    const double theirTime = Median(oggdec);
+    const double ourTime = bench::Median(ours);
+    const double theirTime = bench::Median(oggdec);
     const double peak = *std::max_element(peaks.begin(), peaks.end());
     const double fileBytes = double(ogg.size());
     const double ratio = ourTime / theirTime;
     const double allowed = fileBytes + 1.1 * pcmBytes;
     std::printf("ours (CSoundBuffer::Open in a fresh process), median of %d: %.3f s "
                 "(Open alone %.3f s)\n",
-                runs, ourTime, Median(opens));
+                runs, ourTime, bench::Median(opens));
     std::printf("oggdec -Q -o /dev/null, median of %d: %.3f s\n", runs, theirTime);
     std::printf("peak memory during Open: %.0f bytes = file + %.3f x PCM "
                 "(target at most file + 1.1 x PCM = %.0f bytes): %s\n",

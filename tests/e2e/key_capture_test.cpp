@@ -53,27 +53,6 @@ template <typename Predicate> bool WaitFor(Predicate predicate, DWORD timeoutMs 
     return true;
 }
 
-HWND FindControl(HWND dialog, int id)
-{
-    struct Search
-    {
-        int id;
-        HWND found;
-    } search{id, nullptr};
-    EnumChildWindows(
-        dialog,
-        [](HWND window, LPARAM parameter) -> BOOL
-        {
-            auto* s = reinterpret_cast<Search*>(parameter);
-            if (GetDlgCtrlID(window) != s->id)
-                return TRUE;
-            s->found = window;
-            return FALSE;
-        },
-        reinterpret_cast<LPARAM>(&search));
-    return search.found;
-}
-
 // A tab's item in screen coordinates. TCM_GETITEMRECT writes through its
 // pointer in the tool's own process, so the rectangle is lent from there.
 RECT TabItemOnScreen(HWND tab, int index)
@@ -163,7 +142,7 @@ protected:
         ASSERT_TRUE(ClickTab(GetDlgItem(dialog_, IDC_MAIN_TAB), kKeyConfigTab, keyTab));
     }
 
-    HWND Control(int id) { return FindControl(dialog_, id); }
+    HWND Control(int id) { return e2e::FindControl(dialog_, id); }
 
     // Saves with 保存, closes with Yes and answers the file the tool wrote.
     std::vector<std::uint8_t> SaveAndClose()

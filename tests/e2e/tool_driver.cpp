@@ -212,6 +212,27 @@ bool ToolProcess::IsRunning()
     return Started() && WaitForSingleObject(process_.hProcess, 0) == WAIT_TIMEOUT;
 }
 
+HWND FindControl(HWND dialog, int id)
+{
+    struct Search
+    {
+        int id;
+        HWND found;
+    } search{id, nullptr};
+    EnumChildWindows(
+        dialog,
+        [](HWND window, LPARAM parameter) -> BOOL
+        {
+            auto* s = reinterpret_cast<Search*>(parameter);
+            if (GetDlgCtrlID(window) != s->id)
+                return TRUE;
+            s->found = window;
+            return FALSE;
+        },
+        reinterpret_cast<LPARAM>(&search));
+    return search.found;
+}
+
 std::string WindowText(HWND window)
 {
     char text[1024] = {};

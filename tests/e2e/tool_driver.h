@@ -71,6 +71,8 @@ private:
 };
 
 std::string WindowText(HWND window);
+// A control anywhere below `dialog` (its pages included), by its id.
+HWND FindControl(HWND dialog, int id);
 std::vector<std::uint8_t> ReadFileBytes(const std::string& path);
 bool WriteFileBytes(const std::string& path, const std::vector<std::uint8_t>& bytes);
 

@@ -16,27 +16,6 @@ using e2e::ToolProcess;
 namespace
 {
 
-HWND FindControl(HWND dialog, int id)
-{
-    struct Search
-    {
-        int id;
-        HWND found;
-    } search{id, nullptr};
-    EnumChildWindows(
-        dialog,
-        [](HWND window, LPARAM parameter) -> BOOL
-        {
-            auto* s = reinterpret_cast<Search*>(parameter);
-            if (GetDlgCtrlID(window) != s->id)
-                return TRUE;
-            s->found = window;
-            return FALSE;
-        },
-        reinterpret_cast<LPARAM>(&search));
-    return search.found;
-}
-
 bool WriteText(const std::string& path, const std::string& text)
 {
     return e2e::WriteFileBytes(path, std::vector<std::uint8_t>(text.begin(), text.end()));
@@ -80,7 +59,7 @@ TEST(UserMusicCheck, TypedPathsAreCheckedAndSavedAsTyped)
     // The dialog shows before its pages are made.
     HWND musicEdit = nullptr;
     for (int attempt = 0; attempt < 500 && musicEdit == nullptr; ++attempt, Sleep(20))
-        musicEdit = FindControl(dialog, IDC_MUSIC_PATH_FIRST);
+        musicEdit = e2e::FindControl(dialog, IDC_MUSIC_PATH_FIRST);
     ASSERT_NE(musicEdit, nullptr);
     const HWND page = GetParent(musicEdit);
 
