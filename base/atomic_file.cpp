@@ -8,9 +8,19 @@
 namespace base
 {
 
+std::string TemporaryPathFor(const std::string& path)
+{
+    const std::size_t nameStart = path.find_last_of(std::string("/") + PathSeparator()) + 1;
+    const std::size_t dot = path.rfind('.');
+    if (dot == std::string::npos || dot < nameStart)
+        return path + ".new";
+    const std::string extension = path.substr(dot + 1) == "new" ? "tmp" : "new";
+    return path.substr(0, dot + 1) + extension;
+}
+
 bool WriteFileAtomically(const char* path, const void* data, std::size_t size)
 {
-    const std::string temporary = std::string(path) + ".new";
+    const std::string temporary = TemporaryPathFor(path);
     std::FILE* file = std::fopen(temporary.c_str(), "wb");
     if (file == nullptr)
         return false;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <string>
 
 namespace base
 {
@@ -9,5 +10,10 @@ namespace base
 // the place of `path` in one step. On any failure the temporary file is
 // removed, false is returned and a previous file at `path` is untouched.
 bool WriteFileAtomically(const char* path, const void* data, std::size_t size);
+
+// The temporary file's path: `path` with its extension replaced by "new"
+// ("tmp" for a ".new" file), so that it is no longer than `path` and every
+// path short enough for the system has a temporary name that is too.
+std::string TemporaryPathFor(const std::string& path);
 
 } // namespace base

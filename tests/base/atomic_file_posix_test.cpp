@@ -31,5 +31,5 @@ TEST(AtomicFilePosix, WriteFailingPartWayKeepsTheOldFile)
 
     EXPECT_FALSE(written);
     EXPECT_EQ(ReadBytes(path), old);
-    EXPECT_FALSE(std::filesystem::exists(path + ".new"));
+    EXPECT_FALSE(std::filesystem::exists(base::TemporaryPathFor(path)));
 }

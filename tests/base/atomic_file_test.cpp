@@ -16,7 +16,22 @@ TEST(AtomicFile, ReplacesAnExistingFileAndLeavesNoTemporary)
     const std::uint8_t data[] = {1, 2, 3};
     ASSERT_TRUE(base::WriteFileAtomically(path.c_str(), data, sizeof data));
     EXPECT_EQ(ReadBytes(path), (std::vector<std::uint8_t>{1, 2, 3}));
-    EXPECT_FALSE(std::filesystem::exists(path + ".new"));
+    EXPECT_FALSE(std::filesystem::exists(base::TemporaryPathFor(path)));
+}
+
+TEST(AtomicFile, TheTemporaryNameIsNeverLongerThanTheFile)
+{
+    const struct
+    {
+        const char* path;
+        const char* temporary;
+    } cases[] = {
+        {"GameConfig.dat", "GameConfig.new"},
+        {"a.b/GameConfig", "a.b/GameConfig.new"},
+        {"notes.new", "notes.tmp"},
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(base::TemporaryPathFor(c.path), c.temporary) << c.path;
 }
 
 TEST(AtomicFile, AFolderInTheWayFailsWithoutTouchingIt)
@@ -27,5 +42,5 @@ TEST(AtomicFile, AFolderInTheWayFailsWithoutTouchingIt)
     const std::uint8_t data[] = {1};
     EXPECT_FALSE(base::WriteFileAtomically(path.c_str(), data, sizeof data));
     EXPECT_TRUE(std::filesystem::is_directory(path));
-    EXPECT_FALSE(std::filesystem::exists(path + ".new"));
+    EXPECT_FALSE(std::filesystem::exists(base::TemporaryPathFor(path)));
 }
