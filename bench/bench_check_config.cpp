@@ -77,14 +77,14 @@ int main(int argc, char** argv)
     char folder[] = "/tmp/vek-bench-XXXXXX";
     if (mkdtemp(folder) == nullptr)
         return 2;
-    testing_support::OggSpec spec;
-    spec.channels = 2;
-    spec.sampleRate = kSampleRate;
-    spec.samplesPerChannel = kSeconds * kSampleRate;
-    spec.quality = 0.3f;
+    testing_support::OggFixture fixture;
+    fixture.channels = 2;
+    fixture.sampleRate = kSampleRate;
+    fixture.samplesPerChannel = kSeconds * kSampleRate;
+    fixture.quality = 0.3f;
     const double encodeStart = bench::Now();
     const testing_support::Bytes ogg =
-        testing_support::EncodeOggVorbis(spec, bench::MusicSource(kSampleRate));
+        testing_support::EncodeOggVorbis(fixture, bench::MusicSource(kSampleRate));
     const double encodeSeconds = bench::Now() - encodeStart;
 
     // Limits for 240 s: Hi at most 48 s, Climax at most 24 s.
@@ -118,7 +118,7 @@ int main(int argc, char** argv)
     std::printf("input: %d rows of %llu s stereo %ld Hz Ogg Vorbis at quality 0.3, %zu bytes "
                 "each (encoded in %.1f s); PCM %.0f bytes each\n",
                 kRows, static_cast<unsigned long long>(kSeconds), kSampleRate, ogg.size(),
-                encodeSeconds, double(spec.samplesPerChannel) * 2 * 2);
+                encodeSeconds, double(fixture.samplesPerChannel) * 2 * 2);
 
     std::vector<double> ours, theirs;
     for (int round = 0; round < rounds; ++round)

@@ -100,14 +100,14 @@ int main(int argc, char** argv)
     if (mkdtemp(folder) == nullptr)
         return 2;
     const std::string path = std::string(folder) + "/music.ogg";
-    testing_support::OggSpec spec;
-    spec.channels = kChannels;
-    spec.sampleRate = kSampleRate;
-    spec.samplesPerChannel = kSeconds * kSampleRate;
-    spec.quality = kQuality;
+    testing_support::OggFixture fixture;
+    fixture.channels = kChannels;
+    fixture.sampleRate = kSampleRate;
+    fixture.samplesPerChannel = kSeconds * kSampleRate;
+    fixture.quality = kQuality;
     const double encodeStart = bench::Now();
     const testing_support::Bytes ogg =
-        testing_support::EncodeOggVorbis(spec, bench::MusicSource(kSampleRate));
+        testing_support::EncodeOggVorbis(fixture, bench::MusicSource(kSampleRate));
     std::FILE* out = std::fopen(path.c_str(), "wb");
     if (out == nullptr || std::fwrite(ogg.data(), 1, ogg.size(), out) != ogg.size() ||
         std::fclose(out) != 0)
@@ -115,7 +115,7 @@ int main(int argc, char** argv)
         std::fprintf(stderr, "cannot write %s\n", path.c_str());
         return 2;
     }
-    const double pcmBytes = double(spec.samplesPerChannel) * kChannels * 2;
+    const double pcmBytes = double(fixture.samplesPerChannel) * kChannels * 2;
     std::printf("input: %llu s stereo %ld Hz Ogg Vorbis at quality %.1f, %zu bytes "
                 "(encoded in %.1f s); PCM %.0f bytes\n",
                 static_cast<unsigned long long>(kSeconds), kSampleRate, kQuality, ogg.size(),

@@ -199,17 +199,17 @@ void MakeRiff(const fs::path& root)
 void MakeOgg(const fs::path& root)
 {
     using testing_support::EncodeOggVorbis;
-    using testing_support::OggSpec;
+    using testing_support::OggFixture;
     const Corpus corpus(root, "fuzz_ogg");
 
-    OggSpec mono;
+    OggFixture mono;
     mono.channels = 1;
     mono.sampleRate = 8000;
     mono.samplesPerChannel = 3000;
     const Bytes monoStream = EncodeOggVorbis(mono);
     corpus.Add("mono", monoStream);
 
-    OggSpec stereo;
+    OggFixture stereo;
     stereo.channels = 2;
     stereo.sampleRate = 11025;
     stereo.samplesPerChannel = 6000;

@@ -14,7 +14,7 @@ using sound::DecodedAudio;
 using sound::DecodeOggVorbisFromMemory;
 using testing_support::Bytes;
 using testing_support::EncodeOggVorbis;
-using testing_support::OggSpec;
+using testing_support::OggFixture;
 
 namespace
 {
@@ -92,11 +92,11 @@ TEST(OggDecoder, DecodesTheWholeStreamAsLittleEndianSigned16Bit)
 {
     for (const int channels : {1, 2})
     {
-        OggSpec spec;
-        spec.channels = channels;
-        spec.sampleRate = 22050;
-        spec.samplesPerChannel = 30000;
-        const Bytes stream = EncodeOggVorbis(spec);
+        OggFixture fixture;
+        fixture.channels = channels;
+        fixture.sampleRate = 22050;
+        fixture.samplesPerChannel = 30000;
+        const Bytes stream = EncodeOggVorbis(fixture);
         DecodedAudio audio;
         ASSERT_TRUE(DecodeOggVorbisFromMemory(stream.data(), stream.size(), &audio)) << channels;
         EXPECT_EQ(audio.format->formatTag, 1);
@@ -119,9 +119,9 @@ TEST(OggDecoder, DecodesTheWholeStreamAsLittleEndianSigned16Bit)
 
 TEST(OggDecoder, RefusesCorruptStreams)
 {
-    OggSpec spec;
-    spec.samplesPerChannel = 5000;
-    const Bytes good = EncodeOggVorbis(spec);
+    OggFixture fixture;
+    fixture.samplesPerChannel = 5000;
+    const Bytes good = EncodeOggVorbis(fixture);
     Bytes headerCut(good.begin(), good.begin() + 60);
     Bytes headerDamaged = good;
     for (std::size_t i = 28; i < 60; ++i)
@@ -153,10 +153,10 @@ TEST(OggDecoder, RefusesCorruptStreams)
 // on decoding, never moving the write position backwards or past the block.
 TEST(OggDecoder, PassesOverAHoleAndKeepsTheAnnouncedLength)
 {
-    OggSpec spec;
-    spec.channels = 2;
-    spec.samplesPerChannel = 44100 * 12;
-    std::vector<Bytes> pages = testing_support::SplitOggPages(EncodeOggVorbis(spec));
+    OggFixture fixture;
+    fixture.channels = 2;
+    fixture.samplesPerChannel = 44100 * 12;
+    std::vector<Bytes> pages = testing_support::SplitOggPages(EncodeOggVorbis(fixture));
     ASSERT_GT(pages.size(), 6u);
     pages.erase(pages.begin() + static_cast<long>(pages.size() / 2));
     const Bytes damaged = testing_support::JoinOggPages(pages);
@@ -178,9 +178,9 @@ TEST(OggDecoder, PassesOverAHoleAndKeepsTheAnnouncedLength)
 
 TEST(OggDecoder, ATruncatedStreamDecodesWhatItHolds)
 {
-    OggSpec spec;
-    spec.samplesPerChannel = 44100 * 10;
-    std::vector<Bytes> pages = testing_support::SplitOggPages(EncodeOggVorbis(spec));
+    OggFixture fixture;
+    fixture.samplesPerChannel = 44100 * 10;
+    std::vector<Bytes> pages = testing_support::SplitOggPages(EncodeOggVorbis(fixture));
     ASSERT_GT(pages.size(), 4u);
     pages.resize(pages.size() - 2);
     const Bytes truncated = testing_support::JoinOggPages(pages);
@@ -200,10 +200,10 @@ TEST(OggDecoder, ATruncatedStreamDecodesWhatItHolds)
 // as libvorbisfile refuses it; the block is never written past.
 TEST(OggDecoder, ACutAtEveryPageBoundaryOrInsideAPageDecodesWhatIsLeft)
 {
-    OggSpec spec;
-    spec.channels = 2;
-    spec.samplesPerChannel = 44100 * 3;
-    const Bytes stream = EncodeOggVorbis(spec);
+    OggFixture fixture;
+    fixture.channels = 2;
+    fixture.samplesPerChannel = 44100 * 3;
+    const Bytes stream = EncodeOggVorbis(fixture);
     std::vector<std::size_t> cuts;
     std::size_t boundary = 0;
     for (const Bytes& page : testing_support::SplitOggPages(stream))
@@ -253,10 +253,10 @@ Bytes ClaimingSamples(const Bytes& stream, std::uint64_t samples)
 // the stream's start and cancel out.)
 TEST(OggDecoder, TheAnnouncedLengthSizesTheBlockUpToTheLargestSoundBuffer)
 {
-    OggSpec spec;
-    spec.channels = 1;
-    spec.samplesPerChannel = 44100 * 3;
-    const Bytes stream = EncodeOggVorbis(spec);
+    OggFixture fixture;
+    fixture.channels = 1;
+    fixture.samplesPerChannel = 44100 * 3;
+    const Bytes stream = EncodeOggVorbis(fixture);
     ASSERT_GE(testing_support::SplitOggPages(stream).size(), 4u) << "two of headers, two of audio";
     const std::uint64_t largest = sound::kMaxBufferBytes / 2;
     struct Case
@@ -266,7 +266,7 @@ TEST(OggDecoder, TheAnnouncedLengthSizesTheBlockUpToTheLargestSoundBuffer)
         bool decodes;
     };
     const Case cases[] = {
-        {"ten times the samples held", spec.samplesPerChannel * 10, true},
+        {"ten times the samples held", fixture.samplesPerChannel * 10, true},
         {"as many as the largest sound buffer holds", largest, true},
         {"one more than that", largest + 1, false},
         {"the largest granule position", 0x7FFFFFFFFFFFFFFFull, false},
@@ -280,7 +280,7 @@ TEST(OggDecoder, TheAnnouncedLengthSizesTheBlockUpToTheLargestSoundBuffer)
         if (!c.decodes)
             continue;
         EXPECT_EQ(audio.dataBytes, c.samples * 2) << c.what;
-        const std::size_t held = spec.samplesPerChannel * 2 + 8192;
+        const std::size_t held = fixture.samplesPerChannel * 2 + 8192;
         EXPECT_TRUE(std::all_of(audio.data + held, audio.data + audio.dataBytes,
                                 [](std::uint8_t b) { return b == 0; }))
             << c.what << ": what the pages do not hold is silence";
@@ -290,10 +290,10 @@ TEST(OggDecoder, TheAnnouncedLengthSizesTheBlockUpToTheLargestSoundBuffer)
 // A page whose checksum does not match is dropped as if it were missing.
 TEST(OggDecoder, APageWithABadChecksumIsPassedOverLikeAMissingOne)
 {
-    OggSpec spec;
-    spec.channels = 1;
-    spec.samplesPerChannel = 44100 * 12;
-    Bytes stream = EncodeOggVorbis(spec);
+    OggFixture fixture;
+    fixture.channels = 1;
+    fixture.samplesPerChannel = 44100 * 12;
+    Bytes stream = EncodeOggVorbis(fixture);
     const std::vector<Bytes> pages = testing_support::SplitOggPages(stream);
     ASSERT_GT(pages.size(), 6u);
     std::size_t middle = 0;

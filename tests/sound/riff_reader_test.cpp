@@ -20,9 +20,9 @@ namespace
 
 WaveSpec Pcm(std::uint32_t dataBytes)
 {
-    WaveSpec spec;
-    spec.dataBytes = dataBytes;
-    return spec;
+    WaveSpec fixture;
+    fixture.dataBytes = dataBytes;
+    return fixture;
 }
 
 Bytes Body(std::size_t size)
@@ -50,10 +50,10 @@ TEST(RiffReader, ReadsThePcmFormatAndTheDataChunk)
 
 TEST(RiffReader, PassesOverOtherChunksWithTheirPadding)
 {
-    const WaveSpec spec = Pcm(7);
+    const WaveSpec fixture = Pcm(7);
     const Bytes file = RiffWriter()
                            .Chunk("LIST", Body(5)) // odd: one pad byte follows
-                           .Chunk("fmt ", FormatChunkBody(spec))
+                           .Chunk("fmt ", FormatChunkBody(fixture))
                            .Chunk("fact", Body(4))
                            .Chunk("data", Body(7))
                            .Chunk("smpl", Body(3))
@@ -92,25 +92,25 @@ TEST(RiffReader, ANonPcmFormatKeepsItsExtraBytes)
     };
     for (const Case c : {Case{2, 32}, Case{0xFFFE, 22}, Case{3, 0}, Case{0x55, 1}})
     {
-        WaveSpec spec = Pcm(64);
-        spec.formatTag = c.tag;
-        spec.extra = PatternBytes(c.extra);
-        const Bytes file = MakeWave(spec);
+        WaveSpec fixture = Pcm(64);
+        fixture.formatTag = c.tag;
+        fixture.extra = PatternBytes(c.extra);
+        const Bytes file = MakeWave(fixture);
         DecodedAudio audio;
         ASSERT_TRUE(ReadWaveFromMemory(file.data(), file.size(), &audio)) << c.tag;
         EXPECT_EQ(audio.format->formatTag, c.tag);
         ASSERT_EQ(audio.format->extraSize, c.extra) << c.tag;
         const std::uint8_t* extra = sound::ExtraFormatBytes(*audio.format);
-        EXPECT_EQ(Bytes(extra, extra + c.extra), spec.extra) << c.tag;
+        EXPECT_EQ(Bytes(extra, extra + c.extra), fixture.extra) << c.tag;
         EXPECT_EQ(sound::FormatBytes(*audio.format), 18 + c.extra);
     }
 }
 
 TEST(RiffReader, ANonPcmFormatChunkOfSixteenBytesHasNoExtraBytes)
 {
-    WaveSpec spec = Pcm(16);
-    spec.formatTag = 3;
-    Bytes fmt = FormatChunkBody(spec);
+    WaveSpec fixture = Pcm(16);
+    fixture.formatTag = 3;
+    Bytes fmt = FormatChunkBody(fixture);
     fmt.resize(16);
     const Bytes file = RiffWriter().Chunk("fmt ", fmt).Chunk("data", Body(16)).Finish();
     DecodedAudio audio;
@@ -188,11 +188,11 @@ TEST(RiffReader, RefusesFormatsTheLengthCannotBeComputedFor)
     };
     for (const Case& c : cases)
     {
-        WaveSpec spec = Pcm(64);
-        spec.channels = c.channels;
-        spec.sampleRate = c.rate;
-        spec.bitsPerSample = c.bits;
-        const Bytes file = MakeWave(spec);
+        WaveSpec fixture = Pcm(64);
+        fixture.channels = c.channels;
+        fixture.sampleRate = c.rate;
+        fixture.bitsPerSample = c.bits;
+        const Bytes file = MakeWave(fixture);
         DecodedAudio audio;
         EXPECT_EQ(ReadWaveFromMemory(file.data(), file.size(), &audio), c.opens) << c.what;
     }

@@ -17,7 +17,7 @@ using sound::SourceKind;
 using testing_support::Bytes;
 using testing_support::EncodeOggVorbis;
 using testing_support::MakeWave;
-using testing_support::OggSpec;
+using testing_support::OggFixture;
 using testing_support::PatternBytes;
 using testing_support::ScopedSoundDevice;
 using testing_support::TempFolder;
@@ -41,9 +41,9 @@ protected:
 
     std::string WriteWave(const std::string& name, std::uint32_t dataBytes)
     {
-        WaveSpec spec;
-        spec.dataBytes = dataBytes;
-        return Write(name, MakeWave(spec));
+        WaveSpec fixture;
+        fixture.dataBytes = dataBytes;
+        return Write(name, MakeWave(fixture));
     }
 
     ScopedSoundDevice device_;
@@ -79,12 +79,12 @@ TEST_F(SoundBufferTest, AnOggOf4410000SamplesIsAHundredSecondsWhateverItsChannel
 {
     for (const int channels : {1, 2})
     {
-        OggSpec spec;
-        spec.channels = channels;
-        spec.samplesPerChannel = 4410000;
-        spec.quality = -0.1f;
+        OggFixture fixture;
+        fixture.channels = channels;
+        fixture.samplesPerChannel = 4410000;
+        fixture.quality = -0.1f;
         const std::string path =
-            Write("tune" + std::to_string(channels) + ".ogg", EncodeOggVorbis(spec));
+            Write("tune" + std::to_string(channels) + ".ogg", EncodeOggVorbis(fixture));
         CSoundBuffer buffer;
         ASSERT_TRUE(buffer.Open(path.c_str(), 1, kCapsStatic)) << channels;
         EXPECT_EQ(buffer.GetLength(), 100.0f) << channels;
@@ -117,9 +117,9 @@ TEST(SoundPathRule, OggIsTheLowerOrUpperCaseExtensionAnywhereInThePath)
 
 TEST_F(SoundBufferTest, TheExtensionDecidesHowTheFileIsRead)
 {
-    OggSpec spec;
-    spec.samplesPerChannel = 4410;
-    const Bytes ogg = EncodeOggVorbis(spec);
+    OggFixture fixture;
+    fixture.samplesPerChannel = 4410;
+    const Bytes ogg = EncodeOggVorbis(fixture);
     const Bytes wave = MakeWave(WaveSpec{});
 
     CSoundBuffer backup;
@@ -138,9 +138,9 @@ TEST_F(SoundBufferTest, BrokenWaveFilesDoNotOpen)
 {
     const WaveSpec pcm = []
     {
-        WaveSpec spec;
-        spec.dataBytes = 4000;
-        return spec;
+        WaveSpec fixture;
+        fixture.dataBytes = 4000;
+        return fixture;
     }();
     Bytes shortFormat = testing_support::FormatChunkBody(pcm);
     shortFormat.resize(12);
@@ -183,29 +183,29 @@ TEST_F(SoundBufferTest, FormatsWithoutChannelsRateOrBytesPerSampleDoNotOpen)
     WaveSpec fourBits;
     fourBits.bitsPerSample = 4;
     fourBits.dataBytes = 400;
-    for (const WaveSpec& spec : {noChannels, noRate, fourBits})
+    for (const WaveSpec& fixture : {noChannels, noRate, fourBits})
     {
         CSoundBuffer buffer;
-        EXPECT_FALSE(buffer.Open(Write("odd.wav", MakeWave(spec)).c_str(), 1, kCapsStatic));
+        EXPECT_FALSE(buffer.Open(Write("odd.wav", MakeWave(fixture)).c_str(), 1, kCapsStatic));
     }
 }
 
 TEST_F(SoundBufferTest, ANonPcmWaveKeepsItsExtraFormatBytes)
 {
     // WAVE_FORMAT_EXTENSIBLE, which DirectSound accepts: 22 extra bytes.
-    WaveSpec spec;
-    spec.formatTag = 0xFFFE;
-    spec.extra = {16, 0,    3, 0,    0, 0, 1,    0, 0,    0,    0,
-                  0,  0x10, 0, 0x80, 0, 0, 0xAA, 0, 0x38, 0x9B, 0x71};
-    spec.dataBytes = 4000;
+    WaveSpec fixture;
+    fixture.formatTag = 0xFFFE;
+    fixture.extra = {16, 0,    3, 0,    0, 0, 1,    0, 0,    0,    0,
+                     0,  0x10, 0, 0x80, 0, 0, 0xAA, 0, 0x38, 0x9B, 0x71};
+    fixture.dataBytes = 4000;
     CSoundBuffer buffer;
-    ASSERT_TRUE(buffer.Open(Write("extensible.wav", MakeWave(spec)).c_str(), 1, kCapsStatic));
+    ASSERT_TRUE(buffer.Open(Write("extensible.wav", MakeWave(fixture)).c_str(), 1, kCapsStatic));
     const sound::WaveFormat* format = buffer.GetFormat();
     ASSERT_NE(format, nullptr);
     EXPECT_EQ(format->formatTag, 0xFFFE);
     ASSERT_EQ(format->extraSize, 22);
     const std::uint8_t* extra = sound::ExtraFormatBytes(*format);
-    EXPECT_EQ(Bytes(extra, extra + 22), spec.extra);
+    EXPECT_EQ(Bytes(extra, extra + 22), fixture.extra);
 }
 
 TEST_F(SoundBufferTest, RefusesANullPathAMissingFileAndStreamingMode)
@@ -330,10 +330,10 @@ TEST_F(SoundBufferTest, ReleaseMayRunTwiceAndAnOpenBufferCanBeOpenedAgain)
 
 TEST_F(SoundBufferTest, AnyAllocationFailureFailsCleanly)
 {
-    OggSpec spec;
-    spec.samplesPerChannel = 4410;
+    OggFixture fixture;
+    fixture.samplesPerChannel = 4410;
     const std::string paths[] = {WriteWave("alloc.wav", 4000),
-                                 Write("alloc.ogg", EncodeOggVorbis(spec))};
+                                 Write("alloc.ogg", EncodeOggVorbis(fixture))};
     for (const std::string& path : paths)
     {
         bool opened = false;
@@ -395,10 +395,10 @@ TEST_F(SoundBufferTest, AFolderOrAnEmptyFileIsNoMusic)
 // Wine take them. Whatever the test could write opens as itself, whole.
 TEST_F(SoundBufferTest, PathsOf259260And300BytesOpenTheFileTheyName)
 {
-    OggSpec spec;
-    spec.channels = 1;
-    spec.samplesPerChannel = 44100;
-    const Bytes ogg = EncodeOggVorbis(spec);
+    OggFixture fixture;
+    fixture.channels = 1;
+    fixture.samplesPerChannel = 44100;
+    const Bytes ogg = EncodeOggVorbis(fixture);
     const Bytes wave = testing_support::MakeWaveOfLength(2.0);
     for (const std::size_t length : {259u, 260u, 300u})
     {

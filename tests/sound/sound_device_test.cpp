@@ -44,10 +44,10 @@ TEST(SoundDevice, OnPosixBuffersNeedNoDevice)
 {
     ASSERT_EQ(CurrentSound(), nullptr);
     testing_support::TempFolder folder;
-    testing_support::WaveSpec spec;
-    spec.dataBytes = 4000;
+    testing_support::WaveSpec fixture;
+    fixture.dataBytes = 4000;
     const std::string path = folder.File("headless.wav");
-    testing_support::WriteBytes(path, testing_support::MakeWave(spec));
+    testing_support::WriteBytes(path, testing_support::MakeWave(fixture));
     sound::CSoundBuffer buffer;
     EXPECT_TRUE(buffer.Open(path.c_str(), 1, sound::kCapsStatic));
 }
@@ -55,10 +55,10 @@ TEST(SoundDevice, OnPosixBuffersNeedNoDevice)
 TEST(SoundDevice, ThePosixStandInRefusesBuffersDirectSoundWouldRefuse)
 {
     testing_support::TempFolder folder;
-    testing_support::WaveSpec spec;
-    spec.dataBytes = 2; // below DSBSIZE_MIN
+    testing_support::WaveSpec fixture;
+    fixture.dataBytes = 2; // below DSBSIZE_MIN
     const std::string path = folder.File("tiny.wav");
-    testing_support::WriteBytes(path, testing_support::MakeWave(spec));
+    testing_support::WriteBytes(path, testing_support::MakeWave(fixture));
     sound::CSoundBuffer buffer;
     EXPECT_FALSE(buffer.Open(path.c_str(), 1, sound::kCapsStatic));
 }

@@ -61,20 +61,20 @@ Bytes RiffWriter::Finish(const char* form) const
     return out;
 }
 
-Bytes FormatChunkBody(const WaveSpec& spec)
+Bytes FormatChunkBody(const WaveSpec& fixture)
 {
     Bytes body;
-    const std::uint32_t blockAlign = spec.channels * (spec.bitsPerSample / 8u);
-    PutU16(body, spec.formatTag);
-    PutU16(body, spec.channels);
-    PutU32(body, spec.sampleRate);
-    PutU32(body, blockAlign * spec.sampleRate);
+    const std::uint32_t blockAlign = fixture.channels * (fixture.bitsPerSample / 8u);
+    PutU16(body, fixture.formatTag);
+    PutU16(body, fixture.channels);
+    PutU32(body, fixture.sampleRate);
+    PutU32(body, blockAlign * fixture.sampleRate);
     PutU16(body, blockAlign);
-    PutU16(body, spec.bitsPerSample);
-    if (spec.formatTag != 1)
+    PutU16(body, fixture.bitsPerSample);
+    if (fixture.formatTag != 1)
     {
-        PutU16(body, static_cast<std::uint32_t>(spec.extra.size()));
-        body.insert(body.end(), spec.extra.begin(), spec.extra.end());
+        PutU16(body, static_cast<std::uint32_t>(fixture.extra.size()));
+        body.insert(body.end(), fixture.extra.begin(), fixture.extra.end());
     }
     return body;
 }
@@ -87,22 +87,22 @@ Bytes PatternBytes(std::size_t size)
     return bytes;
 }
 
-Bytes MakeWave(const WaveSpec& spec)
+Bytes MakeWave(const WaveSpec& fixture)
 {
     return RiffWriter()
-        .Chunk("fmt ", FormatChunkBody(spec))
-        .Chunk("data", PatternBytes(spec.dataBytes))
+        .Chunk("fmt ", FormatChunkBody(fixture))
+        .Chunk("data", PatternBytes(fixture.dataBytes))
         .Finish();
 }
 
 Bytes MakeWaveOfLength(double seconds)
 {
-    WaveSpec spec;
-    spec.channels = 1;
-    spec.sampleRate = 1000;
-    spec.bitsPerSample = 8;
-    spec.dataBytes = static_cast<std::uint32_t>(std::llround(seconds * 1000.0));
-    return MakeWave(spec);
+    WaveSpec fixture;
+    fixture.channels = 1;
+    fixture.sampleRate = 1000;
+    fixture.bitsPerSample = 8;
+    fixture.dataBytes = static_cast<std::uint32_t>(std::llround(seconds * 1000.0));
+    return MakeWave(fixture);
 }
 
 SampleSource TuneSource(long sampleRate)
@@ -125,16 +125,16 @@ SampleSource TuneSource(long sampleRate)
     };
 }
 
-Bytes EncodeOggVorbis(const OggSpec& spec)
+Bytes EncodeOggVorbis(const OggFixture& fixture)
 {
-    return EncodeOggVorbis(spec, TuneSource(spec.sampleRate));
+    return EncodeOggVorbis(fixture, TuneSource(fixture.sampleRate));
 }
 
-Bytes EncodeOggVorbis(const OggSpec& spec, const SampleSource& source)
+Bytes EncodeOggVorbis(const OggFixture& fixture, const SampleSource& source)
 {
     vorbis_info info;
     vorbis_info_init(&info);
-    if (vorbis_encode_init_vbr(&info, spec.channels, spec.sampleRate, spec.quality) != 0)
+    if (vorbis_encode_init_vbr(&info, fixture.channels, fixture.sampleRate, fixture.quality) != 0)
     {
         vorbis_info_clear(&info);
         throw std::runtime_error("libvorbisenc refused the encoder settings");
@@ -163,7 +163,7 @@ Bytes EncodeOggVorbis(const OggSpec& spec, const SampleSource& source)
     bool ended = false;
     while (!ended)
     {
-        const std::uint64_t left = spec.samplesPerChannel - written;
+        const std::uint64_t left = fixture.samplesPerChannel - written;
         const int count = left < kBlock ? static_cast<int>(left) : kBlock;
         if (count == 0)
         {
@@ -172,7 +172,7 @@ Bytes EncodeOggVorbis(const OggSpec& spec, const SampleSource& source)
         else
         {
             float** buffer = vorbis_analysis_buffer(&dsp, count);
-            source(buffer, spec.channels, count, written);
+            source(buffer, fixture.channels, count, written);
             vorbis_analysis_wrote(&dsp, count);
             written += count;
         }

@@ -41,16 +41,16 @@ struct WaveSpec
 };
 
 // The body of a "fmt " chunk: 16 bytes for PCM, else 18 plus the extra bytes.
-Bytes FormatChunkBody(const WaveSpec& spec);
+Bytes FormatChunkBody(const WaveSpec& fixture);
 // `size` bytes of a repeating pattern, so that misplaced data shows.
 Bytes PatternBytes(std::size_t size);
-// A whole wave file: "fmt " and a "data" chunk of spec.dataBytes pattern bytes.
-Bytes MakeWave(const WaveSpec& spec);
+// A whole wave file: "fmt " and a "data" chunk of fixture.dataBytes pattern bytes.
+Bytes MakeWave(const WaveSpec& fixture);
 // A wave of `seconds` of 8-bit mono at 1000 Hz: small and exact, for tests
 // that need music of a given length.
 Bytes MakeWaveOfLength(double seconds);
 
-struct OggSpec
+struct OggFixture
 {
     int channels = 2;
     long sampleRate = 44100;
@@ -66,9 +66,9 @@ using SampleSource =
 // A tune: a few tones that move, so that the encoder has real work.
 SampleSource TuneSource(long sampleRate);
 
-// Encodes exactly spec.samplesPerChannel samples per channel.
-Bytes EncodeOggVorbis(const OggSpec& spec, const SampleSource& source);
-Bytes EncodeOggVorbis(const OggSpec& spec);
+// Encodes exactly fixture.samplesPerChannel samples per channel.
+Bytes EncodeOggVorbis(const OggFixture& fixture, const SampleSource& source);
+Bytes EncodeOggVorbis(const OggFixture& fixture);
 
 // The pages of an Ogg stream, each a complete page with its header.
 std::vector<Bytes> SplitOggPages(const Bytes& stream);

@@ -119,13 +119,13 @@ TEST_F(MusicCheckTest, AnAcceptedFileShowsSuccessAndNotItsWarnings)
 
 TEST_F(MusicCheckTest, OggVorbisMusicIsCheckedByItsDecodedLength)
 {
-    testing_support::OggSpec spec;
-    spec.channels = 1;
-    spec.sampleRate = 8000;
-    spec.samplesPerChannel = 8000 * 90;
-    testing_support::WriteBytes("ninety-seconds.ogg", testing_support::EncodeOggVorbis(spec));
-    spec.samplesPerChannel = 8000 * 59;
-    testing_support::WriteBytes("too-short.ogg", testing_support::EncodeOggVorbis(spec));
+    testing_support::OggFixture fixture;
+    fixture.channels = 1;
+    fixture.sampleRate = 8000;
+    fixture.samplesPerChannel = 8000 * 90;
+    testing_support::WriteBytes("ninety-seconds.ogg", testing_support::EncodeOggVorbis(fixture));
+    fixture.samplesPerChannel = 8000 * 59;
+    testing_support::WriteBytes("too-short.ogg", testing_support::EncodeOggVorbis(fixture));
 
     EXPECT_EQ(Check("ninety-seconds.ogg", "named.txt").result, MusicCheckResult::Accepted);
     EXPECT_EQ(Check("too-short.ogg", "named.txt").result, MusicCheckResult::TensionRejected);
