@@ -16,23 +16,24 @@ namespace
 {
 
 // A record that is not all defaults, so that a change by a refused load shows.
-config::CSaveConfig& Previous()
+config::CSaveConfig MakePrevious()
 {
-    static config::CSaveConfig record;
-    static bool made = false;
-    if (!made)
-    {
-        record.ResetAll();
-        config::IpEntry entry{};
-        std::strcpy(entry.octets[0], "192");
-        std::strcpy(entry.octets[1], "168");
-        std::strcpy(entry.octets[2], "000");
-        std::strcpy(entry.octets[3], "*");
-        record.AddAllowEntry(entry);
-        record.AddDenyEntry(entry);
-        record.Graphics()->screenSize = 7;
-        made = true;
-    }
+    config::CSaveConfig record;
+    record.ResetAll();
+    config::IpEntry entry{};
+    std::strcpy(entry.octets[0], "192");
+    std::strcpy(entry.octets[1], "168");
+    std::strcpy(entry.octets[2], "000");
+    std::strcpy(entry.octets[3], "*");
+    record.AddAllowEntry(entry);
+    record.AddDenyEntry(entry);
+    record.Graphics()->screenSize = 7;
+    return record;
+}
+
+const config::CSaveConfig& Previous()
+{
+    static const config::CSaveConfig record = MakePrevious();
     return record;
 }
 

@@ -229,12 +229,21 @@ void MakeOgg(const fs::path& root)
     chained.insert(chained.end(), stereoStream.begin(), stereoStream.end());
     corpus.Add("chained", chained);
 
-    // A last page whose granule position claims far more samples than the
-    // stream holds.
-    Bytes claims = monoStream;
-    const std::vector<Bytes> monoPages = testing_support::SplitOggPages(monoStream);
-    const std::size_t granule = claims.size() - monoPages.back().size() + 6;
-    constexpr std::uint64_t kClaimed = 200000;
+    // Several pages of audio, which the decoder seeks among; and the same
+    // with a last page whose granule position claims far more samples than
+    // the stream holds (with a single page of audio the claim would move the
+    // stream's start as well and cancel out).
+    OggSpec paged;
+    paged.channels = 1;
+    paged.sampleRate = 8000;
+    paged.samplesPerChannel = 8000 * 12;
+    paged.quality = -0.1f;
+    const Bytes pagedStream = EncodeOggVorbis(paged);
+    corpus.Add("several-pages", pagedStream);
+    Bytes claims = pagedStream;
+    const std::size_t granule =
+        claims.size() - testing_support::SplitOggPages(pagedStream).back().size() + 6;
+    constexpr std::uint64_t kClaimed = 8000 * 60;
     for (int i = 0; i < 8; ++i)
         claims[granule + i] = static_cast<std::uint8_t>(kClaimed >> (8 * i));
     testing_support::RepairOggChecksums(claims.data(), claims.size());
