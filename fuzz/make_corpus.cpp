@@ -233,7 +233,7 @@ void MakeOgg(const fs::path& root)
     // with a last page whose granule position claims far more samples than
     // the stream holds (with a single page of audio the claim would move the
     // stream's start as well and cancel out).
-    OggSpec paged;
+    OggFixture paged;
     paged.channels = 1;
     paged.sampleRate = 8000;
     paged.samplesPerChannel = 8000 * 12;
