@@ -126,6 +126,9 @@ private:
     std::int8_t focusedAction_;
     std::uint32_t selectedPlayer_;
     config::IpEntry ipEntry_;
+    // The free 接続 slot that an all-zero address last went to, listed until
+    // another address takes it; -1 for none.
+    int enteredFreeConnectSlot_ = -1;
     PageSlot pages_[kPageCount];
     PageSlot keyPages_[kKeyPageCount];
     SubclassedEdit musicEdits_[config::kUserBgmRowCount];

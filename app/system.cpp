@@ -1,5 +1,7 @@
 #include "app/system.h"
 
+#include "base/cp932.h"
+
 #include <commdlg.h>
 #include <cstdlib>
 #include <cstring>
@@ -80,8 +82,10 @@ bool CSystem::GetModuleDir(char* buffer, std::uint32_t size) const
     const DWORD length = GetModuleFileNameA(instance_, buffer, size);
     // A name cut by the buffer is not terminated on every Windows version.
     buffer[length < size ? length : size - 1] = '\0';
-    for (std::size_t end = std::strlen(buffer); end > 0 && buffer[end - 1] != '\\'; --end)
-        buffer[end - 1] = '\0';
+    // Cut after the last backslash that is a character of its own, never the
+    // trail byte of a double-byte one.
+    const char* last = base::FindLastCharacter(buffer, '\\');
+    buffer[last != nullptr ? last - buffer + 1 : 0] = '\0';
     return true;
 }
 

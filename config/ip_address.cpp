@@ -122,4 +122,15 @@ int FirstEmptyConnectSlot(const ConfigNetwork& network)
     return -1;
 }
 
+std::vector<int> ListedConnectSlots(const ConfigNetwork& network, int enteredFreeSlot)
+{
+    std::vector<int> slots;
+    for (int slot = 0; slot < kConnectSlotCount; ++slot)
+    {
+        if (slot == enteredFreeSlot || !IsConnectSlotEmpty(network.connectList[slot]))
+            slots.push_back(slot);
+    }
+    return slots;
+}
+
 } // namespace config

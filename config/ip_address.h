@@ -7,6 +7,7 @@
 
 #include <cstdint>
 #include <string>
+#include <vector>
 
 namespace config
 {
@@ -47,5 +48,11 @@ std::string IdText(const char (&id)[kIdCapacity]);
 
 // The slot the next 接続 address goes to; -1 when all are taken.
 int FirstEmptyConnectSlot(const ConfigNetwork& network);
+
+// The slots the 接続 list shows, a line each in slot order: every filled slot
+// and, while it stays free, the slot an all-zero address was last entered
+// into (`enteredFreeSlot`, -1 for none). A line finds its slot here, also in a
+// file written with free slots between filled ones.
+std::vector<int> ListedConnectSlots(const ConfigNetwork& network, int enteredFreeSlot);
 
 } // namespace config

@@ -1,6 +1,7 @@
 #include "config/save_config.h"
 
 #include "base/atomic_file.h"
+#include "base/cp932.h"
 #include "base/file_system.h"
 
 #include <cerrno>
@@ -172,7 +173,7 @@ bool BuildSaveDirectory(char* buffer, const char* folder, std::size_t size)
     if (temp == nullptr || size == 0)
         return false;
     const char separator = base::PathSeparator();
-    const char* lastSeparator = std::strrchr(temp, separator);
+    const char* lastSeparator = base::FindLastCharacter(temp, separator);
     const std::size_t kept = lastSeparator != nullptr ? std::size_t(lastSeparator - temp) + 1 : 1;
     const std::size_t companyLength = std::strlen("Tolvenik");
     // The kept part, the two folders with their separators, the file name

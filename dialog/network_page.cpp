@@ -10,6 +10,7 @@
 
 #include <cstdio>
 #include <string>
+#include <vector>
 
 namespace
 {
@@ -68,13 +69,20 @@ void AddLine(HWND page, int listBox, const std::string& line)
     SendDlgItemMessageA(page, listBox, LB_ADDSTRING, 0, reinterpret_cast<LPARAM>(line.c_str()));
 }
 
-// Stores an entered address and shows it. The lines of a list stand for the
-// record's entries in order, as the delete button assumes. A 接続 address
-// takes the first free slot, which can be the line of an all-zero address
-// entered before: such an address leaves its slot free, and its line gives
-// way to the address that now fills the slot.
+// The 接続 list shows the slots ListedConnectSlots names, and is filled anew
+// after each change, so that a line always stands for its slot.
+void FillConnectList(HWND page, const config::ConfigNetwork& network, int enteredFreeSlot)
+{
+    SendDlgItemMessageA(page, IDC_CONNECT_LIST, LB_RESETCONTENT, 0, 0);
+    for (const int slot : config::ListedConnectSlots(network, enteredFreeSlot))
+        AddLine(page, IDC_CONNECT_LIST, config::ConnectLine(network.connectList[slot]));
+}
+
+// Stores an entered address and shows it. A 接続 address takes the first
+// free slot, which can be the one of an all-zero address entered before:
+// such an address leaves its slot free and is listed until another takes it.
 void AddAddress(HWND page, const AddressList& list, config::CSaveConfig& record,
-                const config::IpEntry& entry)
+                const config::IpEntry& entry, int& enteredFreeSlot)
 {
     // Looked up before the address fills it.
     const int slot = config::FirstEmptyConnectSlot(*record.Network());
@@ -83,27 +91,42 @@ void AddAddress(HWND page, const AddressList& list, config::CSaveConfig& record,
         MessageBoxA(page, list.addFailure, kErrorCaption, MB_OK);
         return;
     }
-    const std::string line = list.line(entry);
-    const HWND listBox = GetDlgItem(page, list.listBox);
-    if (list.listBox == IDC_CONNECT_LIST && slot < SendMessageA(listBox, LB_GETCOUNT, 0, 0))
+    if (list.listBox != IDC_CONNECT_LIST)
     {
-        SendMessageA(listBox, LB_DELETESTRING, slot, 0);
-        SendMessageA(listBox, LB_INSERTSTRING, slot, reinterpret_cast<LPARAM>(line.c_str()));
+        AddLine(page, list.listBox, list.line(entry));
         return;
     }
-    AddLine(page, list.listBox, line);
+    const config::ConfigNetwork& network = *record.Network();
+    enteredFreeSlot = config::IsConnectSlotEmpty(network.connectList[slot]) ? slot : -1;
+    FillConnectList(page, network, enteredFreeSlot);
 }
 
-void DeleteAddress(HWND page, const AddressList& list, config::CSaveConfig& record)
+void DeleteAddress(HWND page, const AddressList& list, config::CSaveConfig& record,
+                   int& enteredFreeSlot)
 {
     const auto selected =
         static_cast<std::int32_t>(SendDlgItemMessageA(page, list.listBox, LB_GETCURSEL, 0, 0));
-    if (!(record.*list.remove)(selected))
+    std::int32_t index = selected;
+    if (list.listBox == IDC_CONNECT_LIST)
+    {
+        const std::vector<int> slots =
+            config::ListedConnectSlots(*record.Network(), enteredFreeSlot);
+        index = selected >= 0 && std::size_t(selected) < slots.size() ? slots[selected] : -1;
+    }
+    if (!(record.*list.remove)(index))
     {
         MessageBoxA(page, "削除するIPアドレスをリストから選択してください。", kErrorCaption, MB_OK);
         return;
     }
-    SendDlgItemMessageA(page, list.listBox, LB_DELETESTRING, selected, 0);
+    if (list.listBox != IDC_CONNECT_LIST)
+    {
+        SendDlgItemMessageA(page, list.listBox, LB_DELETESTRING, selected, 0);
+        return;
+    }
+    // The slots after the removed one moved up by one.
+    if (enteredFreeSlot >= index)
+        enteredFreeSlot = enteredFreeSlot == index ? -1 : enteredFreeSlot - 1;
+    FillConnectList(page, *record.Network(), enteredFreeSlot);
 }
 
 } // namespace
@@ -126,11 +149,8 @@ void CConfigApplication::InitNetworkPage()
     dialog::FillChoices(page, IDC_NETWORK_KEY_RESPONSE, config::kKeyResponseNames,
                         network.keyResponse);
 
-    for (const config::IpEntry& slot : network.connectList)
-    {
-        if (!config::IsConnectSlotEmpty(slot))
-            AddLine(page, IDC_CONNECT_LIST, config::ConnectLine(slot));
-    }
+    enteredFreeConnectSlot_ = -1;
+    FillConnectList(page, network, enteredFreeConnectSlot_);
     for (std::uint32_t index = 0; index < network.allowCount; ++index)
         AddLine(page, IDC_ALLOW_LIST, config::ListedLine(*record_->GetAllowEntry(index)));
     for (std::uint32_t index = 0; index < network.denyCount; ++index)
@@ -178,10 +198,10 @@ LRESULT CConfigApplication::OnNetworkPage(HWND page, UINT message, WPARAM wParam
             if (DialogBoxParamA(system_->GetInstance(), MAKEINTRESOURCEA(IDD_IP_ENTRY),
                                 system_->GetHwnd(), IpEntryDialogProc,
                                 reinterpret_cast<LPARAM>(this)) == 1)
-                AddAddress(page, *list, *record_, ipEntry_);
+                AddAddress(page, *list, *record_, ipEntry_, enteredFreeConnectSlot_);
         }
         else if (const AddressList* list = ListDeletedBy(control))
-            DeleteAddress(page, *list, *record_);
+            DeleteAddress(page, *list, *record_, enteredFreeConnectSlot_);
     }
     return 1;
 }

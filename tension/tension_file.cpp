@@ -1,12 +1,12 @@
 #include "tension/tension_file.h"
 
+#include "base/c_runtime.h"
 #include "base/cp932.h"
 #include "sound/sound_buffer.h"
 
 #include <cmath>
 #include <cstdarg>
 #include <cstdio>
-#include <cstdlib>
 #include <cstring>
 #include <new>
 
@@ -261,8 +261,9 @@ bool CTensionFile::LoadFromArchiveList(sound::CSoundBuffer* sound, const char* e
 
 bool CTensionFile::LoadFromFile(sound::CSoundBuffer* sound, const char* path, CTextString* log)
 {
-    // Text mode: a CR LF pair reads as one line feed on Windows.
-    std::FILE* file = path != nullptr ? std::fopen(path, "r") : nullptr;
+    // Read as bytes and translated here, so that every build sees the text
+    // the game sees through the Windows runtime's text mode.
+    std::FILE* file = path != nullptr ? std::fopen(path, "rb") : nullptr;
     std::size_t count = 0;
     if (file != nullptr)
     {
@@ -292,7 +293,7 @@ bool CTensionFile::LoadFromFile(sound::CSoundBuffer* sound, const char* path, CT
         Record(log, "File Buffer Allocator Error!!");
         return false;
     }
-    text[std::fread(text, 1, count, file)] = '\0';
+    text[base::TranslateTextMode(text, std::fread(text, 1, count, file))] = '\0';
     std::fclose(file);
     const bool parsed = Parse(sound, text, ':', ';', log);
     if (!parsed)
@@ -502,7 +503,7 @@ float CTensionFile::ReadTime(const char* text, char terminator, std::size_t* pos
     bool cut = false;
     if (!ReadValue(text, terminator, position, value, &cut) || cut)
         return -1.0f;
-    return static_cast<float>(std::atof(value));
+    return static_cast<float>(base::ReadDecimal(value));
 }
 
 int CTensionFile::GetTensionIndex(const char* key)

@@ -43,6 +43,8 @@ TEST(SaveDirectory, IsBuiltBesideTheLastFolderOfTemp)
     EXPECT_EQ(SaveDirectoryFor(base + "Temp" + sep),
               base + "Temp" + sep + "Tolvenik" + sep + "VEK" + sep)
         << "a trailing separator keeps the whole value";
+    EXPECT_EQ(SaveDirectoryFor(base + "ソTemp"), base + "Tolvenik" + sep + "VEK" + sep)
+        << "the trail byte of ソ is not a backslash";
     EXPECT_EQ(SaveDirectoryFor("X"), "XTolvenik" + sep + "VEK" + sep)
         << "without a separator only the first character is kept";
 }

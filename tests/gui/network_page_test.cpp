@@ -451,6 +451,27 @@ TEST(NetworkPage, AnAllZeroConnectAddressIsListedButItsSlotGoesToTheNextAddress)
               (std::vector<std::string>{"1.2.3.4"}));
 }
 
+TEST(NetworkPage, ConnectLinesStayWithTheirSlotsInAFileWithFreeSlotsBetween)
+{
+    config::CSaveConfig record;
+    record.ResetAll();
+    record.Network()->connectList[1] = Entry("001", "001", "001", "001");
+    record.Network()->connectList[3] = Entry("003", "003", "003", "003");
+    RunningTool tool(record.SaveToBytes());
+    const HWND page = tool.Page(kNetworkPage);
+    EXPECT_EQ(Lines(page, IDC_CONNECT_LIST), (std::vector<std::string>{"1.1.1.1", "3.3.3.3"}));
+
+    Add(tool, kLists[0], {"9", "9", "9", "9"});
+    EXPECT_EQ(Lines(page, IDC_CONNECT_LIST),
+              (std::vector<std::string>{"9.9.9.9", "1.1.1.1", "3.3.3.3"}));
+    Select(page, IDC_CONNECT_LIST, 2);
+    tool.Click(page, IDC_CONNECT_DELETE);
+    EXPECT_EQ(Lines(page, IDC_CONNECT_LIST), (std::vector<std::string>{"9.9.9.9", "1.1.1.1"}));
+    EXPECT_EQ(Entries(tool.Record(), Kind::Connect),
+              (std::vector<std::string>{Bytes(Entry("009", "009", "009", "009")),
+                                        Bytes(Entry("001", "001", "001", "001"))}));
+}
+
 TEST(NetworkPage, SavedListsAreByteForByteWhatWasEntered)
 {
     RunningTool tool;

@@ -2,6 +2,7 @@
 // window, its failure messages, and XInput loaded at run time.
 #include "input/input.h"
 
+#include <cstring>
 #include <gtest/gtest.h>
 #include <string>
 #include <vector>
@@ -78,13 +79,21 @@ TEST_F(DeviceLayer, StartsOnAWindowWithKeyboardAndMouseAndNoController)
     in.Release();
 }
 
-TEST_F(DeviceLayer, XInputIsLoadedAtRunTimeAndAbsentPadsFallBack)
+// The build plants an xinput1_3.dll beside the tests that claims a pad is
+// attached; no controller is attached where the tests run.
+TEST_F(DeviceLayer, XInputComesFromTheSystemFolderNotFromBesideTheProgram)
 {
     CXInputPad pad;
     ASSERT_TRUE(pad.Init(0));
-    // No controller is attached where the tests run.
     EXPECT_FALSE(pad.Poll());
-    EXPECT_NE(::GetModuleHandleA("xinput1_3.dll"), nullptr);
+    char loaded[MAX_PATH] = {};
+    char system[MAX_PATH] = {};
+    ASSERT_NE(::GetModuleFileNameA(::GetModuleHandleA("xinput1_3.dll"), loaded, MAX_PATH), 0u);
+    ::GetSystemDirectoryA(system, MAX_PATH);
+    EXPECT_EQ(::CompareStringA(LOCALE_INVARIANT, NORM_IGNORECASE, loaded,
+                               static_cast<int>(std::strlen(system)), system, -1),
+              CSTR_EQUAL)
+        << loaded;
     EXPECT_TRUE(pad.SetVibration(100, 200));
 }
 
