@@ -1,13 +1,13 @@
 #include "cli/settings_report.h"
 
 #include "cli/encoding.h"
+#include "config/fixed_text.h"
 #include "config/ip_address.h"
 #include "config/setting_names.h"
-#include "dialog/page_values.h"
+#include "config/volume.h"
 #include "input/name_tables.h"
 
 #include <cstdio>
-#include <cstring>
 
 namespace cli
 {
@@ -15,10 +15,6 @@ namespace
 {
 
 using Kind = Setting::Kind;
-
-// The choices of the pages' combo boxes, by the index the record stores.
-
-// The key assignment pages' label of each action.
 
 Setting Group(std::string name)
 {
@@ -55,11 +51,9 @@ Setting Text(std::string name, std::string utf8, std::string meaning = std::stri
     return setting;
 }
 
-// A string field of the record: code page 932, up to its first zero or its
-// whole capacity when a damaged file left none.
-std::string Field(const char* field, std::size_t capacity)
+template <std::size_t N> std::string Field(const char (&field)[N])
 {
-    return Utf8FromCp932(std::string_view(field, strnlen(field, capacity)));
+    return Utf8FromCp932(config::FieldText(field));
 }
 
 std::string OnOff(std::uint32_t value)
@@ -77,7 +71,7 @@ Setting Choice(std::string name, long long value, const char* const (&choices)[N
 
 Setting Volume(std::string name, std::int32_t value)
 {
-    if (value == dialog::kSilentVolume)
+    if (value == config::kSilentVolume)
         return Number(std::move(name), value, "silent");
     char decibels[32];
     std::snprintf(decibels, sizeof decibels, "%.2f dB", value / 100.0);
@@ -132,8 +126,8 @@ Setting Network(const config::CSaveConfig& record)
     children.push_back(Number("port", network.port));
     children.push_back(Number("useUpnp", network.useUpnp, OnOff(network.useUpnp)));
     children.push_back(Choice("keyResponse", network.keyResponse, config::kKeyResponseNames));
-    children.push_back(Text("lobbyId", Utf8FromCp932(config::IdText(network.lobbyId))));
-    children.push_back(Text("directId", Utf8FromCp932(config::IdText(network.directId))));
+    children.push_back(Text("lobbyId", Field(network.lobbyId)));
+    children.push_back(Text("directId", Field(network.directId)));
 
     // The lists as the network page lists them: the filled 接続 slots in
     // slot order, then every 許可 and 拒否 entry.
@@ -182,9 +176,8 @@ Setting UserBgm(const config::ConfigUserBgm& userBgm)
     for (const config::UserBgmRow& stored : userBgm.rows)
     {
         Setting row = Group("");
-        row.children.push_back(Text("musicPath", Field(stored.musicPath, config::kPathCapacity)));
-        row.children.push_back(
-            Text("tensionPath", Field(stored.tensionPath, config::kPathCapacity)));
+        row.children.push_back(Text("musicPath", Field(stored.musicPath)));
+        row.children.push_back(Text("tensionPath", Field(stored.tensionPath)));
         rows.children.push_back(std::move(row));
     }
     group.children.push_back(std::move(rows));
@@ -239,8 +232,7 @@ Setting RadioChat(const config::ConfigRadioChat& radioChat)
         key += std::to_string(i + 1);
         const std::string everyone = Utf8FromCp932("全体");
         Setting entry = Group("");
-        entry.children.push_back(
-            Text("text", Field(stored.text, config::kRadioChatTextCapacity), key));
+        entry.children.push_back(Text("text", Field(stored.text), key));
         entry.children.push_back(
             Number("notToAll", stored.notToAll,
                    key + (stored.notToAll == 0 ? ": to everyone (" + everyone + " checked)"

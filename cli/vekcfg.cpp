@@ -7,6 +7,7 @@
 #include "cli/settings_file.h"
 #include "cli/settings_report.h"
 #include "cli/timeline_svg.h"
+#include "config/fixed_text.h"
 #include "config/save_config.h"
 
 #include <cerrno>
@@ -106,11 +107,6 @@ bool LoadSettings(const Invocation& invocation, config::CSaveConfig& record, std
     return true;
 }
 
-std::string StoredPath(const char (&field)[config::kPathCapacity])
-{
-    return std::string(field, strnlen(field, config::kPathCapacity));
-}
-
 int CheckConfig(const Invocation& invocation)
 {
     config::CSaveConfig record;
@@ -129,10 +125,10 @@ int CheckConfig(const Invocation& invocation)
     for (int row = 0; row < config::kUserBgmRowCount; ++row)
     {
         const config::UserBgmRow& stored = record.UserBgm()->rows[row];
-        const std::string music = StoredPath(stored.musicPath);
+        const std::string music = config::FieldText(stored.musicPath);
         if (music.empty())
             continue;
-        const std::string tensionPath = StoredPath(stored.tensionPath);
+        const std::string tensionPath = config::FieldText(stored.tensionPath);
         tension::CTextString message;
         const tension::MusicCheckResult result =
             tension::CheckMusicRow(music.c_str(), tensionPath.c_str(), &message);

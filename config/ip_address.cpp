@@ -1,6 +1,6 @@
 #include "config/ip_address.h"
 
-#include "base/cp932.h"
+#include "config/fixed_text.h"
 #include "config/save_config.h"
 
 #include <climits>
@@ -63,9 +63,7 @@ bool ReadOctet(const char* text, char (&octet)[4])
 
 int OctetValue(const char (&octet)[4])
 {
-    char text[sizeof octet + 1] = {};
-    std::memcpy(text, octet, sizeof octet);
-    return ReadLeadingInteger(text);
+    return ReadLeadingInteger(FieldText(octet).c_str());
 }
 
 std::string ConnectLine(const IpEntry& entry)
@@ -79,37 +77,13 @@ std::string ConnectLine(const IpEntry& entry)
 
 std::string ListedLine(const IpEntry& entry)
 {
-    char line[32];
-    std::snprintf(line, sizeof line, "%.4s.%.4s.%.4s.%.4s", entry.octets[0], entry.octets[1],
-                  entry.octets[2], entry.octets[3]);
-    return line;
+    return FieldText(entry.octets[0]) + "." + FieldText(entry.octets[1]) + "." +
+           FieldText(entry.octets[2]) + "." + FieldText(entry.octets[3]);
 }
 
 std::uint16_t ReadPort(const char* text)
 {
     return static_cast<std::uint16_t>(static_cast<unsigned int>(ReadLeadingInteger(text)));
-}
-
-void CopyId(char (&id)[kIdCapacity], const char* text)
-{
-    std::size_t kept = 0;
-    while (text[kept] != '\0')
-    {
-        const std::size_t width =
-            base::IsLeadByte(static_cast<std::uint8_t>(text[kept])) && text[kept + 1] != '\0' ? 2
-                                                                                              : 1;
-        if (kept + width > kIdTextLimit)
-            break;
-        kept += width;
-    }
-    std::memset(id, 0, sizeof id);
-    std::memcpy(id, text, kept);
-}
-
-std::string IdText(const char (&id)[kIdCapacity])
-{
-    const void* end = std::memchr(id, '\0', sizeof id);
-    return std::string(id, end != nullptr ? static_cast<const char*>(end) : id + sizeof id);
 }
 
 int FirstEmptyConnectSlot(const ConfigNetwork& network)

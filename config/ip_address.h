@@ -1,7 +1,7 @@
 #pragma once
 
 // What the network page decides about the texts it is given: octets of an
-// address, the port, the two IDs, and how an address reads in each list.
+// address and the port, and how an address reads in each list.
 
 #include "config/config_sections.h"
 
@@ -23,8 +23,7 @@ int ReadLeadingInteger(const char* text);
 // for an empty text or a value out of range; `octet` is then unchanged.
 bool ReadOctet(const char* text, char (&octet)[4]);
 
-// The number a stored octet stands for ("*" and other text read as 0). An
-// octet from a file need not be terminated.
+// The number a stored octet stands for ("*" and other text read as 0).
 int OctetValue(const char (&octet)[4]);
 
 // The 接続 list shows the numbers: 192.168.000.001 as 192.168.0.1, "*" as 0.
@@ -35,16 +34,6 @@ std::string ListedLine(const IpEntry& entry);
 // The PORT text as a port: the low 16 bits of its leading integer, so 70000
 // is 4464 and -1 is 65535.
 std::uint16_t ReadPort(const char* text);
-
-inline constexpr int kIdTextLimit = kIdCapacity - 2;
-
-// Puts an ID text into its field: at most kIdTextLimit bytes, never half of
-// a double-byte character (the game would read a lone lead byte together
-// with the terminator), and zeros after it.
-void CopyId(char (&id)[kIdCapacity], const char* text);
-
-// The text of an ID field; one from a file need not be terminated.
-std::string IdText(const char (&id)[kIdCapacity]);
 
 // The slot the next 接続 address goes to; -1 when all are taken.
 int FirstEmptyConnectSlot(const ConfigNetwork& network);

@@ -3,6 +3,7 @@
 #include "base/atomic_file.h"
 #include "base/cp932.h"
 #include "base/file_system.h"
+#include "config/fixed_text.h"
 
 #include <cerrno>
 #include <cstdio>
@@ -159,9 +160,7 @@ bool IsConnectSlotEmpty(const IpEntry& entry)
 {
     for (const char(&octet)[4] : entry.octets)
     {
-        char text[5] = {};
-        std::memcpy(text, octet, sizeof octet);
-        if (std::atoi(text) != 0)
+        if (std::atoi(FieldText(octet).c_str()) != 0)
             return false;
     }
     return true;

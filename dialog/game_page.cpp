@@ -1,8 +1,8 @@
 // The Game page: game options, the three volumes and the game's choices.
 #include "app/config_application.h"
 #include "config/setting_names.h"
+#include "config/volume.h"
 #include "dialog/page_controls.h"
-#include "dialog/page_values.h"
 #include "resources/resource.h"
 
 #include <commctrl.h>
@@ -33,7 +33,7 @@ bool CConfigApplication::InitGamePage()
     dialog::ShowCheck(page, IDC_CAPTURE_ENABLED, game->captureEnabled != 0);
 
     // The range travels as two 16-bit words: the low one is -3000 (0xF448).
-    const LPARAM range = MAKELPARAM(static_cast<WORD>(dialog::kSliderMinimumVolume), 0);
+    const LPARAM range = MAKELPARAM(static_cast<WORD>(config::kSliderMinimumVolume), 0);
     for (const VolumeSlider& slider : kVolumeSliders)
     {
         SendDlgItemMessageA(page, slider.id, TBM_SETLINESIZE, 0, 10);
@@ -65,7 +65,7 @@ LRESULT CConfigApplication::OnGamePage(HWND page, UINT message, WPARAM wParam, L
         {
             const auto position =
                 static_cast<std::int32_t>(SendDlgItemMessageA(page, slider.id, TBM_GETPOS, 0, 0));
-            game->*slider.field = dialog::VolumeAtSliderPosition(position);
+            game->*slider.field = config::VolumeAtSliderPosition(position);
         }
         return TRUE;
     }

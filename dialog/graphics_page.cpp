@@ -2,7 +2,6 @@
 #include "app/config_application.h"
 #include "config/setting_names.h"
 #include "dialog/page_controls.h"
-#include "dialog/page_values.h"
 #include "resources/resource.h"
 
 namespace

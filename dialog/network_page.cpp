@@ -3,6 +3,7 @@
 // buttons run. Every change goes into the record at once.
 #include "app/config_application.h"
 #include "app/system.h"
+#include "config/fixed_text.h"
 #include "config/ip_address.h"
 #include "config/setting_names.h"
 #include "dialog/page_controls.h"
@@ -138,8 +139,8 @@ void CConfigApplication::InitNetworkPage()
 
     // Each text set here comes back at once as the edit's update, so the
     // record's fields are read into copies first.
-    SetDlgItemTextA(page, IDC_NETWORK_LOBBY_ID, config::IdText(network.lobbyId).c_str());
-    SetDlgItemTextA(page, IDC_NETWORK_DIRECT_ID, config::IdText(network.directId).c_str());
+    SetDlgItemTextA(page, IDC_NETWORK_LOBBY_ID, config::FieldText(network.lobbyId).c_str());
+    SetDlgItemTextA(page, IDC_NETWORK_DIRECT_ID, config::FieldText(network.directId).c_str());
     char port[16];
     std::snprintf(port, sizeof port, "%d", network.port);
     SetDlgItemTextA(page, IDC_NETWORK_PORT, port);
@@ -177,9 +178,9 @@ LRESULT CConfigApplication::OnNetworkPage(HWND page, UINT message, WPARAM wParam
         }
         GetDlgItemTextA(page, control, text, sizeof text);
         if (control == IDC_NETWORK_LOBBY_ID)
-            config::CopyId(network.lobbyId, text);
+            config::StoreFieldText(network.lobbyId, config::kIdTextLimit, text);
         else if (control == IDC_NETWORK_DIRECT_ID)
-            config::CopyId(network.directId, text);
+            config::StoreFieldText(network.directId, config::kIdTextLimit, text);
     }
     else if (code == CBN_SELCHANGE && control == IDC_NETWORK_KEY_RESPONSE)
     {

@@ -1,11 +1,10 @@
 // The Radio-chat page: the twelve messages of the function keys F1 to F12
 // and whether each goes to everyone.
 #include "app/config_application.h"
+#include "config/fixed_text.h"
 #include "dialog/page_controls.h"
-#include "dialog/page_values.h"
 #include "resources/resource.h"
 
-#include <cstring>
 #include <string>
 
 namespace
@@ -20,17 +19,14 @@ constexpr int ToAllId(int row)
     return IDC_RADIO_CHAT_TO_ALL_FIRST + IDC_RADIO_CHAT_ROW_STEP * row;
 }
 
-// Takes the edit's whole text and keeps what the field holds of it. The
-// bytes after the terminator keep whatever they held.
+// Takes the edit's whole text and keeps what the field holds of it.
 void KeepMessage(HWND edit, config::RadioChatEntry* entry)
 {
     const int capacity = GetWindowTextLengthA(edit) + 1;
     std::string text(static_cast<std::size_t>(capacity), '\0');
     const int length = GetWindowTextA(edit, text.data(), capacity);
-    const std::size_t kept =
-        dialog::KeptRadioChatLength(text.data(), static_cast<std::size_t>(length));
-    std::memcpy(entry->text, text.data(), kept);
-    entry->text[kept] = '\0';
+    text.resize(static_cast<std::size_t>(length > 0 ? length : 0));
+    config::StoreFieldText(entry->text, config::kRadioChatTextLimit, text);
 }
 } // namespace
 
@@ -41,8 +37,7 @@ bool CConfigApplication::InitRadioChatPage()
     for (int row = 0; row < config::kRadioChatCount; ++row)
     {
         const config::RadioChatEntry& entry = radioChat->entries[row];
-        // A file may fill the field to its last byte with no terminator.
-        const std::string text(entry.text, strnlen(entry.text, sizeof entry.text));
+        const std::string text = config::FieldText(entry.text);
         // The edit reports the new text at once (EN_UPDATE): the record then
         // holds only what it can keep of it.
         SetDlgItemTextA(page, TextId(row), text.c_str());

@@ -4,6 +4,7 @@
 // way the game will load it.
 #include "app/config_application.h"
 #include "app/system.h"
+#include "config/fixed_text.h"
 #include "dialog/user_music_values.h"
 #include "resources/resource.h"
 #include "tension/music_check.h"
@@ -43,7 +44,7 @@ void TakeDroppedFile(HDROP drop, HWND edit, char (&field)[config::kPathCapacity]
     char path[config::kPathCapacity] = {};
     if (DragQueryFileA(drop, 0, path, sizeof path) != 0)
     {
-        dialog::StorePath(field, path);
+        config::StoreFieldText(field, config::kPathTextLimit, path);
         SetWindowTextA(edit, path);
     }
     DragFinish(drop);
@@ -53,7 +54,7 @@ void StoreEditText(HWND edit, char (&field)[config::kPathCapacity])
 {
     char text[config::kPathCapacity] = {};
     GetWindowTextA(edit, text, sizeof text);
-    dialog::StorePath(field, text);
+    config::StoreFieldText(field, config::kPathTextLimit, text);
 }
 
 // The music file, then at once its tension file. The main dialog stays
@@ -69,7 +70,7 @@ void BrowseRow(CSystem& system, config::UserBgmRow& paths, HWND musicEdit, HWND 
         EnableWindow(mainDialog, TRUE);
         return;
     }
-    dialog::StorePath(paths.musicPath, music);
+    config::StoreFieldText(paths.musicPath, config::kPathTextLimit, music);
     SetWindowTextA(musicEdit, music);
 
     char tensionFile[config::kPathCapacity] = {};
@@ -78,7 +79,7 @@ void BrowseRow(CSystem& system, config::UserBgmRow& paths, HWND musicEdit, HWND 
     EnableWindow(mainDialog, TRUE);
     if (!chosen)
         return;
-    dialog::StorePath(paths.tensionPath, tensionFile);
+    config::StoreFieldText(paths.tensionPath, config::kPathTextLimit, tensionFile);
     SetWindowTextA(tensionEdit, tensionFile);
 }
 
@@ -87,8 +88,8 @@ bool CheckRow(const config::UserBgmRow& paths)
 {
     tension::CTextString message;
     const tension::MusicCheckResult result =
-        tension::CheckMusicRow(dialog::PathText(paths.musicPath).c_str(),
-                               dialog::PathText(paths.tensionPath).c_str(), &message);
+        tension::CheckMusicRow(config::FieldText(paths.musicPath).c_str(),
+                               config::FieldText(paths.tensionPath).c_str(), &message);
     MessageBoxA(nullptr, message.CStr(), "", MB_OK);
     return result == tension::MusicCheckResult::Accepted;
 }
@@ -103,9 +104,9 @@ bool CConfigApplication::InitUserMusicPage()
     {
         const int step = IDC_MUSIC_ROW_STEP * row;
         Subclass(musicEdits_[row], page, IDC_MUSIC_PATH_FIRST + step, procedure_,
-                 dialog::PathText(music->rows[row].musicPath));
+                 config::FieldText(music->rows[row].musicPath));
         Subclass(tensionEdits_[row], page, IDC_TENSION_PATH_FIRST + step, procedure_,
-                 dialog::PathText(music->rows[row].tensionPath));
+                 config::FieldText(music->rows[row].tensionPath));
     }
     return true;
 }

@@ -1,15 +1,12 @@
 #pragma once
 
 // What the user music page decides without a window: which row and which
-// control an identifier names, and how a path goes into and out of its
-// record field.
+// control an identifier names.
 
 #include "config/config_sections.h"
 #include "resources/resource.h"
 
-#include <cstring>
 #include <optional>
-#include <string>
 
 namespace dialog
 {
@@ -38,26 +35,6 @@ constexpr std::optional<MusicControl> MusicControlOf(int id)
         return std::nullopt;
     return MusicControl{offset / IDC_MUSIC_ROW_STEP,
                         static_cast<MusicColumn>(offset % IDC_MUSIC_ROW_STEP)};
-}
-
-// The text of a path field. One from a file need not be terminated: it ends
-// at the field's last byte.
-inline std::string PathText(const char (&field)[config::kPathCapacity])
-{
-    const void* end = std::memchr(field, '\0', sizeof field);
-    return std::string(field,
-                       end != nullptr ? static_cast<const char*>(end) - field : sizeof field - 1);
-}
-
-// Puts a path into its field: at most 259 bytes and the terminator, zeros
-// after it, so that a shorter path leaves nothing of a longer one behind.
-inline void StorePath(char (&field)[config::kPathCapacity], const char* text)
-{
-    std::size_t length = 0;
-    while (length < sizeof field - 1 && text[length] != '\0')
-        ++length;
-    std::memcpy(field, text, length);
-    std::memset(field + length, 0, sizeof field - length);
 }
 
 } // namespace dialog

@@ -92,52 +92,14 @@ TEST(AddressLines, ConnectShowsNumbersAndTheOtherListsTheStoredOctets)
         {Entry("192", "168", "000", "001"), "192.168.0.1", "192.168.000.001"},
         {Entry("*", "010", "*", "255"), "0.10.0.255", "*.010.*.255"},
         {Entry("000", "000", "000", "000"), "0.0.0.0", "000.000.000.000"},
-        // Octets from a file that fill all four bytes are read no further.
-        {Entry("1234", "5678", "9012", "3456"), "1234.5678.9012.3456", "1234.5678.9012.3456"},
+        // An octet from a file that fills all four bytes ends before its last.
+        {Entry("1234", "5678", "9012", "3456"), "123.567.901.345", "123.567.901.345"},
     };
     for (const auto& c : cases)
     {
         EXPECT_EQ(config::ConnectLine(c.entry), c.connect);
         EXPECT_EQ(config::ListedLine(c.entry), c.listed);
     }
-}
-
-TEST(Id, KeepsAtMost31BytesAndClearsTheRestOfTheField)
-{
-    char id[config::kIdCapacity];
-    std::memset(id, 'z', sizeof id);
-    config::CopyId(id, std::string(40, 'a').c_str());
-    EXPECT_EQ(Bytes(id, sizeof id), std::string(31, 'a') + std::string(2, '\0'));
-
-    config::CopyId(id, "abc");
-    EXPECT_EQ(Bytes(id, sizeof id), "abc" + std::string(30, '\0'));
-}
-
-TEST(Id, NeverKeepsHalfOfADoubleByteCharacter)
-{
-    // "表" is 95 5C: its trail byte is a backslash, its lead byte must not
-    // stand alone before the terminator.
-    const std::pair<std::string, std::string> cases[] = {
-        {std::string(29, 'a') + "表表", std::string(29, 'a') + "表"},
-        {std::string(30, 'a') + "表", std::string(30, 'a')},
-        {"表表表表表表表表表表表表表表表表", "表表表表表表表表表表表表表表表"},
-        {std::string(30, 'a') + "x表", std::string(30, 'a') + "x"},
-    };
-    for (const auto& [text, kept] : cases)
-    {
-        char id[config::kIdCapacity];
-        config::CopyId(id, text.c_str());
-        EXPECT_EQ(std::string(id), kept) << text.size();
-    }
-}
-
-TEST(Id, TextOfAFieldWithoutTerminatorStopsAtTheFieldsEnd)
-{
-    char id[config::kIdCapacity];
-    std::memset(id, 'q', sizeof id);
-    EXPECT_EQ(config::IdText(id), std::string(config::kIdCapacity, 'q'));
-    std::strcpy(id, "lobby");
-    EXPECT_EQ(config::IdText(id), "lobby");
 }
 
 TEST(ConnectSlots, TheNextAddressTakesTheFirstSlotThatReadsAsAllZero)

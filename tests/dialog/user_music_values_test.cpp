@@ -1,9 +1,7 @@
 // What the user music page decides without a window.
 #include "dialog/user_music_values.h"
 
-#include <cstring>
 #include <gtest/gtest.h>
-#include <string>
 
 using dialog::MusicColumn;
 using dialog::MusicControlOf;
@@ -30,24 +28,4 @@ TEST(MusicControl, EachIdentifierNamesItsRowAndControl)
     }
     for (const int id : {0, 7000, 7041, 1})
         EXPECT_FALSE(MusicControlOf(id).has_value()) << id;
-}
-
-TEST(MusicPath, AFieldWithoutItsZeroEndsAtItsLastByte)
-{
-    char field[config::kPathCapacity];
-    std::memset(field, 'x', sizeof field);
-    EXPECT_EQ(dialog::PathText(field), std::string(259, 'x'));
-    std::memcpy(field, "a.wav", 6);
-    EXPECT_EQ(dialog::PathText(field), "a.wav");
-}
-
-TEST(MusicPath, StoringKeeps259BytesAndClearsTheRest)
-{
-    char field[config::kPathCapacity];
-    std::memset(field, 'x', sizeof field);
-    dialog::StorePath(field, std::string(400, 'p').c_str());
-    EXPECT_EQ(std::string(field, sizeof field), std::string(259, 'p') + '\0');
-
-    dialog::StorePath(field, "b.ogg");
-    EXPECT_EQ(std::string(field, sizeof field), "b.ogg" + std::string(255, '\0'));
 }

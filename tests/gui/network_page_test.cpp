@@ -2,6 +2,7 @@
 // the dialog's fields are typed into and its buttons pressed from a CBT hook
 // while the add button's modal loop runs.
 #include "base/memory.h"
+#include "config/fixed_text.h"
 #include "config/ip_address.h"
 #include "resources/resource.h"
 #include "tests/gui/gui_harness.h"
@@ -264,9 +265,9 @@ TEST(NetworkPage, EachControlWritesItsFieldAtOnce)
         EXPECT_EQ(network.port, port) << text;
     }
     tool.Type(page, IDC_NETWORK_LOBBY_ID, std::string(40, 'L'));
-    EXPECT_EQ(config::IdText(network.lobbyId), std::string(31, 'L'));
+    EXPECT_EQ(config::FieldText(network.lobbyId), std::string(31, 'L'));
     tool.Type(page, IDC_NETWORK_DIRECT_ID, "直接ID");
-    EXPECT_EQ(config::IdText(network.directId), "直接ID");
+    EXPECT_EQ(config::FieldText(network.directId), "直接ID");
 }
 
 TEST(NetworkPage, EachAddButtonRunsTheIpDialogAndListsWhatOkAccepts)
