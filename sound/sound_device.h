@@ -95,7 +95,8 @@ namespace device
 // DSERR_BUFFERLOST restores the buffer and locks once more) and `pcm` stays
 // the caller's; on POSIX the buffer takes the block and sets `pcm` to null.
 // Null on failure (no current device on Windows, a size outside
-// kMinBufferBytes..kMaxBufferBytes, any DirectSound failure).
+// kMinBufferBytes..kMaxBufferBytes, a format DirectSound does not mix, see
+// IsPlayableFormat; any DirectSound failure).
 DeviceBuffer* CreateStaticBuffer(const WaveFormat& format, std::uint32_t capsFlags,
                                  std::uint8_t*& pcm, std::uint32_t bytes);
 // A duplicate sharing the master's data; null on failure.

@@ -87,10 +87,11 @@ CSound* CurrentSound()
 namespace device
 {
 
-DeviceBuffer* CreateStaticBuffer(const WaveFormat&, std::uint32_t, std::uint8_t*& pcm,
+DeviceBuffer* CreateStaticBuffer(const WaveFormat& format, std::uint32_t, std::uint8_t*& pcm,
                                  std::uint32_t bytes)
 {
-    if (pcm == nullptr || bytes < kMinBufferBytes || bytes > kMaxBufferBytes)
+    if (pcm == nullptr || bytes < kMinBufferBytes || bytes > kMaxBufferBytes ||
+        !IsPlayableFormat(format))
         return nullptr;
     auto* store = static_cast<PcmStore*>(base::AllocateZeroed(sizeof(PcmStore)));
     auto* buffer = new (std::nothrow) DeviceBuffer();

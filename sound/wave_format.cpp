@@ -2,6 +2,8 @@
 
 #include "base/memory.h"
 
+#include <cstring>
+
 namespace sound
 {
 
@@ -26,6 +28,51 @@ const std::uint8_t* ExtraFormatBytes(const WaveFormat& format)
 bool IsOpenableFormat(const WaveFormat& format)
 {
     return format.channels != 0 && format.samplesPerSec != 0 && format.bitsPerSample >= 8;
+}
+
+namespace
+{
+
+// KSDATAFORMAT_SUBTYPE_PCM and _IEEE_FLOAT as stored: the format tag in the
+// GUID's first two bytes, then the bytes these sub-formats share.
+constexpr std::uint8_t kSubFormatTail[14] = {0x00, 0x00, 0x00, 0x00, 0x10, 0x00, 0x80,
+                                             0x00, 0x00, 0xAA, 0x00, 0x38, 0x9B, 0x71};
+constexpr std::size_t kSubFormatOffset = 6;
+
+bool IsMixableTag(std::uint16_t tag)
+{
+    return tag == kFormatTagPcm || tag == kFormatTagIeeeFloat;
+}
+
+bool IsPlayableExtensible(const WaveFormat& format)
+{
+    if (format.extraSize < kExtensibleExtraBytes)
+        return false;
+    const std::uint8_t* extra = ExtraFormatBytes(format);
+    const std::uint8_t* subFormat = extra + kSubFormatOffset;
+    const bool mixable = IsMixableTag(std::uint16_t(subFormat[0] | subFormat[1] << 8)) &&
+                         std::memcmp(subFormat + 2, kSubFormatTail, sizeof kSubFormatTail) == 0;
+    // More extra bytes than the structure's own are refused, except a count
+    // that is the whole structure's size.
+    const bool sized =
+        format.extraSize == kExtensibleExtraBytes || format.extraSize == kExtensibleStructBytes;
+    const std::uint16_t validBits = std::uint16_t(extra[0] | extra[1] << 8);
+    return mixable && sized && validBits <= format.bitsPerSample;
+}
+
+} // namespace
+
+bool IsPlayableFormat(const WaveFormat& format)
+{
+    if (!IsMixableTag(format.formatTag) && format.formatTag != kFormatTagExtensible)
+        return false;
+    const std::uint32_t frameBytes = std::uint32_t(format.channels) * format.bitsPerSample / 8u;
+    const bool consistent = format.bitsPerSample >= 8 && format.bitsPerSample % 8 == 0 &&
+                            format.channels != 0 && format.samplesPerSec != 0 &&
+                            format.avgBytesPerSec != 0 && format.blockAlign == frameBytes;
+    if (!consistent)
+        return false;
+    return format.formatTag != kFormatTagExtensible || IsPlayableExtensible(format);
 }
 
 float ComputeLength(std::uint32_t dataBytes, const WaveFormat& format)

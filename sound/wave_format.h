@@ -7,6 +7,12 @@ namespace sound
 {
 
 inline constexpr std::uint16_t kFormatTagPcm = 1;
+inline constexpr std::uint16_t kFormatTagIeeeFloat = 3;
+inline constexpr std::uint16_t kFormatTagExtensible = 0xFFFE;
+// WAVEFORMATEXTENSIBLE: the 18 bytes of the format, then 22 extra bytes
+// (valid bits per sample, channel mask, sub-format GUID); 40 in all.
+inline constexpr std::uint16_t kExtensibleExtraBytes = 22;
+inline constexpr std::uint16_t kExtensibleStructBytes = 40;
 
 // Sizes a static DirectSound buffer can have (DSBSIZE_MIN, DSBSIZE_MAX). The
 // decoders refuse more data than that before allocating it, since no buffer
@@ -39,6 +45,16 @@ const std::uint8_t* ExtraFormatBytes(const WaveFormat& format);
 // A format that the length formula can divide by: at least one channel, a
 // sample rate above zero and at least 8 bits per sample.
 bool IsOpenableFormat(const WaveFormat& format);
+
+// Whether DirectSound makes a secondary buffer of the format (followed by
+// its `extraSize` extra bytes), as measured under Wine: format tag PCM or
+// IEEE float, or WAVE_FORMAT_EXTENSIBLE with 22 extra bytes (40 pass too),
+// a PCM or float sub-format and no more valid bits than bits; whole bytes
+// per sample; channels, rate and bytes per second above zero; block align
+// exactly channels x bytes per sample. Neither a range of rates nor bytes
+// per second = rate x block align is required. The POSIX stand-in refuses
+// what this refuses, so that both builds turn away the same files.
+bool IsPlayableFormat(const WaveFormat& format);
 
 // Seconds of `dataBytes` bytes of the format: bytes / channels / rate /
 // (bits per sample / 8), in double precision, stored as a 32-bit float.
