@@ -4,10 +4,11 @@
 #include "sound/sound_device.h"
 
 // In this order: <dsound.h> needs the wave formats of <mmsystem.h>, which
-// the lean <windows.h> leaves out.
+// the lean <windows.h> leaves out; <mmreg.h> adds the extensible format.
 // clang-format off
 #include <windows.h>
 #include <mmsystem.h>
+#include <mmreg.h>
 #include <dsound.h>
 // clang-format on
 

@@ -19,6 +19,10 @@ static_assert(kCapsStatic == DSBCAPS_STATIC && kCapsCtrl3D == DSBCAPS_CTRL3D &&
               kCapsCtrlPositionNotify == DSBCAPS_CTRLPOSITIONNOTIFY);
 static_assert(kMinBufferBytes == DSBSIZE_MIN && kMaxBufferBytes == DSBSIZE_MAX);
 static_assert(sizeof(WaveFormat) == sizeof(WAVEFORMATEX));
+static_assert(kFormatTagPcm == WAVE_FORMAT_PCM && kFormatTagIeeeFloat == WAVE_FORMAT_IEEE_FLOAT &&
+              kFormatTagExtensible == WAVE_FORMAT_EXTENSIBLE);
+static_assert(kExtensibleStructBytes == sizeof(WAVEFORMATEXTENSIBLE) &&
+              kExtensibleExtraBytes == sizeof(WAVEFORMATEXTENSIBLE) - sizeof(WAVEFORMATEX));
 static_assert(sizeof(DSCAPS) == 96);
 
 IDirectSoundBuffer8* Native(DeviceBuffer* buffer)

@@ -1,6 +1,8 @@
-// DirectSound paths that the real device never takes here: each failing step
-// of Init with its message, and a buffer lost during the first lock.
+// DirectSound paths that the real device never takes here (each failing step
+// of Init with its message, a buffer lost during the first lock), and the
+// formats the real device makes static buffers of.
 #include "sound/direct_sound_win32.h"
+#include "sound/wave_format.h"
 #include "tests/support/sound_device_fixture.h"
 
 #include <gtest/gtest.h>
@@ -284,4 +286,131 @@ TEST(DirectSoundDevice, WithoutADeviceNoBufferCanBeMade)
     std::uint8_t* pcm = bytes;
     EXPECT_EQ(sound::device::CreateStaticBuffer(format, sound::kCapsStatic, pcm, sizeof bytes),
               nullptr);
+}
+
+namespace
+{
+
+// A "fmt " chunk as a file gives it: WAVEFORMATEXTENSIBLE, with room for 40
+// extra bytes rather than its own 22.
+struct FormatBlock
+{
+    WAVEFORMATEXTENSIBLE format;
+    BYTE moreExtra[sizeof(WAVEFORMATEX)];
+};
+
+FormatBlock Plain(WORD tag, WORD channels, DWORD rate, WORD bits)
+{
+    FormatBlock block{};
+    WAVEFORMATEX& format = block.format.Format;
+    format.wFormatTag = tag;
+    format.nChannels = channels;
+    format.nSamplesPerSec = rate;
+    format.wBitsPerSample = bits;
+    format.nBlockAlign = static_cast<WORD>(channels * bits / 8);
+    format.nAvgBytesPerSec = rate * format.nBlockAlign;
+    return block;
+}
+
+FormatBlock Extensible(WORD bits, WORD validBits, const GUID& subFormat)
+{
+    FormatBlock block = Plain(WAVE_FORMAT_EXTENSIBLE, 2, 44100, bits);
+    block.format.Format.cbSize = sizeof(WAVEFORMATEXTENSIBLE) - sizeof(WAVEFORMATEX);
+    block.format.Samples.wValidBitsPerSample = validBits;
+    block.format.dwChannelMask = SPEAKER_FRONT_LEFT | SPEAKER_FRONT_RIGHT;
+    block.format.SubFormat = subFormat;
+    return block;
+}
+
+template <typename Change> FormatBlock With(FormatBlock block, Change change)
+{
+    change(block.format);
+    return block;
+}
+
+GUID AdpcmSubFormat()
+{
+    GUID adpcm = KSDATAFORMAT_SUBTYPE_PCM;
+    adpcm.Data1 = WAVE_FORMAT_ADPCM;
+    return adpcm;
+}
+
+// B-format surround: PCM samples, yet not the PCM sub-format, though its
+// GUID starts like it.
+constexpr GUID kAmbisonicPcmSubFormat{
+    0x00000001, 0x0721, 0x11D3, {0x86, 0x44, 0xC8, 0xC1, 0xCA, 0x00, 0x00, 0x00}};
+
+} // namespace
+
+// What IDirectSound8::CreateSoundBuffer answers for the static buffer of a
+// check, measured under Wine, and what the POSIX stand-in answers through
+// IsPlayableFormat: the same, row by row. Windows documents part of it:
+// compressed formats only in hardware buffers, which the check never asks
+// for; block align = channels x bytes per sample; whole-byte containers, at
+// least 22 extra bytes and no more valid bits than bits for the extensible
+// format. Where it only says "should" (bytes per second = rate x block
+// align), or speaks of SetFrequency rather than of a format
+// (DSBFREQUENCY_MIN and _MAX), Wine refuses nothing and the stand-in
+// neither. Pages for pre-WDM drivers limit software buffers to 8 and 16
+// bits; those for WDM drivers take wider, float and multichannel formats,
+// as Wine does.
+TEST(DirectSoundFormats, TheStandInRefusesExactlyWhatDirectSoundRefuses)
+{
+    struct Row
+    {
+        const char* protects;
+        FormatBlock block;
+        bool accepted;
+    };
+    const Row rows[] = {
+        {"16-bit stereo PCM", Plain(WAVE_FORMAT_PCM, 2, 44100, 16), true},
+        {"12-bit samples are not whole bytes", Plain(WAVE_FORMAT_PCM, 2, 44100, 12), false},
+        {"a block align other than channels x bytes per sample",
+         With(Plain(WAVE_FORMAT_PCM, 2, 44100, 16), [](auto& f) { f.Format.nBlockAlign = 8; }),
+         false},
+        {"no bytes per second",
+         With(Plain(WAVE_FORMAT_PCM, 2, 44100, 16), [](auto& f) { f.Format.nAvgBytesPerSec = 0; }),
+         false},
+        {"any other bytes per second",
+         With(Plain(WAVE_FORMAT_PCM, 2, 44100, 16), [](auto& f) { f.Format.nAvgBytesPerSec = 1; }),
+         true},
+        {"a compressed format tag", Plain(WAVE_FORMAT_ADPCM, 2, 44100, 16), false},
+        {"IEEE float samples of 64 bits", Plain(WAVE_FORMAT_IEEE_FLOAT, 2, 44100, 64), true},
+        {"eight channels", Plain(WAVE_FORMAT_PCM, 8, 44100, 16), true},
+        {"1 Hz, below DSBFREQUENCY_MIN", Plain(WAVE_FORMAT_PCM, 1, 1, 8), true},
+        {"384000 Hz, above DSBFREQUENCY_MAX", Plain(WAVE_FORMAT_PCM, 2, 384000, 16), true},
+        {"extensible PCM of 24 valid bits in 32", Extensible(32, 24, KSDATAFORMAT_SUBTYPE_PCM),
+         true},
+        {"extensible without its extra bytes",
+         With(Extensible(16, 16, KSDATAFORMAT_SUBTYPE_PCM), [](auto& f) { f.Format.cbSize = 0; }),
+         false},
+        {"extensible of a sub-format other than PCM and float",
+         Extensible(16, 16, AdpcmSubFormat()), false},
+        {"extensible of Ambisonic B-format", Extensible(16, 16, kAmbisonicPcmSubFormat), false},
+        {"extensible with more valid bits than bits", Extensible(16, 17, KSDATAFORMAT_SUBTYPE_PCM),
+         false},
+        {"extensible with extra bytes beyond its own",
+         With(Extensible(16, 16, KSDATAFORMAT_SUBTYPE_PCM), [](auto& f) { f.Format.cbSize = 23; }),
+         false},
+        // Wine's allowance for writers that count the whole structure.
+        {"extensible counting its whole structure as extra bytes",
+         With(Extensible(32, 32, KSDATAFORMAT_SUBTYPE_IEEE_FLOAT),
+              [](auto& f) { f.Format.cbSize = sizeof(WAVEFORMATEXTENSIBLE); }),
+         true},
+    };
+    testing_support::ScopedSoundDevice device;
+    ASSERT_TRUE(device.Ready());
+    std::vector<std::uint8_t> pcm(1024);
+    for (const Row& row : rows)
+    {
+        const auto& format = reinterpret_cast<const sound::WaveFormat&>(row.block);
+        std::uint8_t* data = pcm.data();
+        sound::DeviceBuffer* buffer = sound::device::CreateStaticBuffer(
+            format, sound::kCapsStatic, data, static_cast<std::uint32_t>(pcm.size()));
+        EXPECT_EQ(buffer != nullptr, row.accepted) << "DirectSound: " << row.protects;
+        EXPECT_EQ(sound::IsPlayableFormat(format), row.accepted)
+            << "IsPlayableFormat: " << row.protects;
+        if (buffer != nullptr)
+            sound::device::Release(buffer);
+    }
 }
