@@ -13,6 +13,7 @@
 #include <fstream>
 #include <stdexcept>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace
@@ -128,6 +129,18 @@ void MusicFiles(Corpus& corpus)
                      .Chunk("data", testing_support::PatternBytes(stereo.dataBytes))
                      .Finish());
 
+    // Extensible formats, told apart by their sub-format: PCM plays, ADPCM does not.
+    for (const auto& [name, subFormat] :
+         {std::pair{"extensible-pcm.wav", 1}, {"extensible-adpcm.wav", 2}})
+    {
+        WaveSpec spec{0xFFFE, 1, 8000, 16, {16, 0, 4, 0, 0, 0}, 180 * 8000 * 2};
+        const Bytes guidTail = {0, 0, 0, 0, 0x10, 0, 0x80, 0, 0, 0xAA, 0, 0x38, 0x9B, 0x71};
+        spec.extra.push_back(std::uint8_t(subFormat));
+        spec.extra.push_back(0);
+        spec.extra.insert(spec.extra.end(), guidTail.begin(), guidTail.end());
+        corpus.Write(name, MakeWave(spec));
+    }
+
     testing_support::OggFixture ogg;
     ogg.channels = 1;
     ogg.sampleRate = 8000;
@@ -189,7 +202,7 @@ int main(int argc, char** argv)
     for (const char* music :
          {"music.ogg", "short.wav", "pcm16-stereo.wav", "pcm12.wav", "pcm24.wav", "pcm32.wav",
           "float32.wav", "adpcm.wav", "six-channels.wav", "rate-50.wav", "rate-250000.wav",
-          "bad-block-align.wav", "missing.wav"})
+          "bad-block-align.wav", "extensible-pcm.wav", "extensible-adpcm.wav", "missing.wav"})
         corpus.Case(std::string("check --details ") + music + " lf.txt");
     for (const char* settings : {"rows.dat", "unterminated.dat"})
     {
