@@ -36,7 +36,7 @@ struct WaveSpec
     std::uint32_t sampleRate = 44100;
     std::uint16_t bitsPerSample = 16;
     // Written after a u16 count for a tag other than 1.
-    Bytes extra;
+    Bytes extra = {};
     std::uint32_t dataBytes = 0;
 };
 
