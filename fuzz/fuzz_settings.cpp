@@ -7,7 +7,6 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <cstring>
 #include <vector>
 
 using fuzzing::Require;
@@ -20,11 +19,7 @@ config::CSaveConfig MakePrevious()
 {
     config::CSaveConfig record;
     record.ResetAll();
-    config::IpEntry entry{};
-    std::strcpy(entry.octets[0], "192");
-    std::strcpy(entry.octets[1], "168");
-    std::strcpy(entry.octets[2], "000");
-    std::strcpy(entry.octets[3], "*");
+    const config::IpEntry entry{{"192", "168", "000", "*"}};
     record.AddAllowEntry(entry);
     record.AddDenyEntry(entry);
     record.Graphics()->screenSize = 7;

@@ -1,7 +1,8 @@
 #pragma once
 
-// What every fuzz target shares: a property check that stops the run the
-// way a crash does, so that libFuzzer keeps the input that broke it.
+// What the fuzz targets share: a property check that stops the run the way
+// a crash does, so that libFuzzer keeps the input that broke it.
+#include <cstddef>
 #include <cstdio>
 #include <cstdlib>
 
@@ -19,5 +20,11 @@ inline void Require(bool holds, const char* what)
     std::fprintf(stderr, "property broken: %s\n", what);
     std::abort();
 }
+
+// fuzz_tension's input: two little-endian bytes give the music's length in
+// 1/64 s (0 to 1024 s: too short, in range and too long, in steps the time
+// values of a text can meet exactly), the rest is the tension text.
+inline constexpr std::size_t kTensionLengthBytes = 2;
+inline constexpr double kTensionLengthUnit = 1.0 / 64.0;
 
 } // namespace fuzzing

@@ -6,8 +6,6 @@
 // - every message of the log ends with a line feed;
 // - an accepted file has a name of 1 to 40 bytes and a comment of at most 160.
 // The game's queries of the timeline run over the result as well.
-#include "fuzz/fuzz_tension.h"
-
 #include "fuzz/fuzz_support.h"
 #include "tension/tension_file.h"
 
@@ -18,36 +16,11 @@
 
 using fuzzing::Require;
 
-namespace
-{
-
-void CheckTimeline(const tension::CKeyFrameList& timeline, float length)
-{
-    const std::uint32_t count = timeline.GetKeyCount();
-    Require(count >= 1, "the timeline holds its first key");
-    const tension::KeyFrame* first = timeline.GetKey(0);
-    Require(first->time == 0.0f &&
-                first->value == static_cast<std::int32_t>(tension::TensionLevel::Normal),
-            "the timeline starts Normal at 0");
-    for (std::uint32_t i = 1; i < count; ++i)
-    {
-        const tension::KeyFrame* key = timeline.GetKey(i);
-        Require(key->time > timeline.GetKey(i - 1)->time, "keys ascend in time");
-        Require(key->time <= length, "keys lie inside the music");
-        Require(key->value >= 0 && key->value <= 3, "keys hold a level");
-    }
-    if (length > tension::CKeyFrameList::kMinimumKeyDistance)
-        Require(timeline.GetKey(count - 1)->time == length, "the last key closes the music");
-}
-
-} // namespace
-
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
 {
     if (size < fuzzing::kTensionLengthBytes)
         return 0;
-    const unsigned units = data[0] | data[1] << 8;
-    const auto length = static_cast<float>(units * fuzzing::kTensionLengthUnit);
+    const auto length = static_cast<float>((data[0] | data[1] << 8) * fuzzing::kTensionLengthUnit);
     // An exact copy with its zero, so that a read past the end is caught.
     const std::size_t textBytes = size - fuzzing::kTensionLengthBytes;
     const std::unique_ptr<char[]> text(new char[textBytes + 1]);
@@ -67,9 +40,22 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
                 "an accepted name is 1 to 40 bytes");
         Require(file.GetComment().Length() <= 160, "an accepted comment is at most 160 bytes");
     }
-    if (file.GetTimeline() == nullptr)
+    const tension::CKeyFrameList* timeline = file.GetTimeline();
+    if (timeline == nullptr)
         return 0;
-    CheckTimeline(*file.GetTimeline(), length);
+    const std::uint32_t count = timeline->GetKeyCount();
+    Require(count >= 1 && timeline->GetKey(0)->time == 0.0f &&
+                timeline->GetKey(0)->value == static_cast<int>(tension::TensionLevel::Normal),
+            "the timeline starts Normal at 0");
+    for (std::uint32_t i = 1; i < count; ++i)
+    {
+        const tension::KeyFrame* key = timeline->GetKey(i);
+        Require(key->time > timeline->GetKey(i - 1)->time, "keys ascend in time");
+        Require(key->time <= length, "keys lie inside the music");
+        Require(key->value >= 0 && key->value <= 3, "keys hold a level");
+    }
+    if (length > tension::CKeyFrameList::kMinimumKeyDistance)
+        Require(timeline->GetKey(count - 1)->time == length, "the last key closes the music");
     for (const float time : {0.0f, length * 0.5f, length, length * 2.5f, file.GetFinaleTime()})
     {
         const auto level = static_cast<std::int32_t>(file.GetTension(time));
