@@ -1,9 +1,6 @@
-// Writes the seed corpora of the fuzz targets into fuzz/corpus/<target>/ with
-// our own writers: the record's image writer and the tests' RIFF and Ogg
-// Vorbis fixture writers. A few well-formed files of each kind; the fuzzer
-// and its dictionary break them.
-//
-// Usage: make_fuzz_corpus <corpus folder>   (the folder's old seeds are replaced)
+// make_fuzz_corpus <folder>: replaces the seeds in <folder>/<target>/ with a
+// few well-formed files of each kind, from the record's image writer and the
+// tests' RIFF and Ogg Vorbis writers; the fuzzer and its dictionary break them.
 #include "config/save_config.h"
 #include "fuzz/fuzz_support.h"
 #include "tests/support/audio_fixtures.h"
