@@ -24,8 +24,8 @@ std::size_t PageSize(const std::uint8_t* data, std::size_t size)
     return total <= size ? total : 0;
 }
 
-} // namespace
-
+// CRC-32 with the polynomial 0x04C11DB7, not reflected, starting from 0,
+// over the page with its checksum field zero.
 std::uint32_t OggPageChecksum(const std::uint8_t* page, std::size_t size)
 {
     std::uint32_t crc = 0;
@@ -38,6 +38,8 @@ std::uint32_t OggPageChecksum(const std::uint8_t* page, std::size_t size)
     }
     return crc;
 }
+
+} // namespace
 
 std::size_t RepairOggChecksums(std::uint8_t* data, std::size_t size)
 {

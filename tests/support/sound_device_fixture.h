@@ -18,7 +18,6 @@ public:
     ScopedSoundDevice& operator=(const ScopedSoundDevice&) = delete;
 
     bool Ready() const { return ready_; }
-    sound::CSound& Device() { return device_; }
 
 private:
     sound::CSound device_;
