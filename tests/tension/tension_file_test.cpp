@@ -267,6 +267,7 @@ TEST(TensionQuery, TheGameAsksACopyForTheLevelAndTheFinaleAtATime)
         EXPECT_EQ(copy.GetTension(c.time), c.level) << c.time;
         EXPECT_EQ(copy.IsFinale(c.time), c.finale) << c.time;
     }
+    EXPECT_STREQ(tension::LevelMessageName(L), "LowTension") << "as the checks name it";
     copy.SetLoopStart(60.0f);
     EXPECT_EQ(copy.GetTension(215.0f), TensionLevel::Low) << "folded to 60 + 35 s";
 }
@@ -312,6 +313,7 @@ TEST_F(TensionLoad, FilesAreReadInTextModeAndNamedByTheirPathUntilAnEntryNamesTh
 TEST(TensionArchive, AnEntryIsLoadedByItsExactNameFromTheFirstArchiveThatLoadsIt)
 {
     tension::CqvxPackFile failing, good;
+    ASSERT_TRUE(failing.AddEntry("other", "", 0));
     ASSERT_TRUE(failing.AddEntry("song", "CF:1;\nCF:2;\n", 12));
     ASSERT_TRUE(good.AddEntry("song", "LOW:30;", 7));
     EXPECT_FALSE(good.AddEntry(nullptr, "", 0));
