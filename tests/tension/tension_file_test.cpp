@@ -148,7 +148,7 @@ TEST(TensionParse, EntriesKeysValuesAndComments)
          "FN:x;\nLT:30;\nLT:30.005;\nLT:29.995;\nLT:30.006;\n"
          "LT:30.007;\nLT:29.993;\nLT:199.995;",
          true, kKeyAdd + kKeyAdd + kKeyAdd + kKeyAdd, "0N 29.993L 30L 30.007L 200N"},
-        {"entries but accepted levels pass over the character after them", 200,
+        {"entries other than accepted levels pass over the character after them", 200,
          "FN:x;ロLOW:30;\nFC:c;HI:40;\nCF:50;LOW:60;\nLOW:0;HI:20;\n", true,
          kNotTension + kNotTension + kOutside + kNotTension, "0N 30L 200N"},
         {"an unknown key skips to its terminator; it and an accepted level leave the next whole",
