@@ -1,0 +1,65 @@
+// The key-config sub-pages' wiring: the names of the record's codes, the
+// player list, the reset buttons and the edit that names the focused action.
+// Capturing a real key press is a black-box run (tests/e2e).
+#include "input/input.h"
+#include "input/name_tables.h"
+#include "resources/resource.h"
+#include "tests/gui/gui_harness.h"
+
+#include <windowsx.h>
+
+using gui::ControlText;
+using gui::RunningTool;
+
+namespace
+{
+void Shuffle(config::CSaveConfig& record)
+{
+    config::ConfigKeys& keys = *record.Keys();
+    keys.keyboardKeys[14] = 0x2D;
+    keys.padConfigs[0].buttons[16] = 14;
+    keys.padConfigs[2].buttons[16] = 30;
+    keys.padConfigs[2].device = 7;
+}
+} // namespace
+
+TEST(KeyPages, ShowTheShownPlayersCodesAndResetOnlyThem)
+{
+    RunningTool tool(Shuffle);
+    const HWND keyboard = tool.KeyPage(kKeyboardPageIndex);
+    const HWND pad = tool.KeyPage(kPadPageIndex);
+    EXPECT_EQ(ControlText(keyboard, IDC_KEYBOARD_EDIT_FIRST + 14), input::KeyName(0x2D));
+    EXPECT_EQ(ControlText(pad, IDC_PAD_EDIT_FIRST + 16), input::PadButtonName(14));
+
+    ComboBox_SetCurSel(GetDlgItem(pad, IDC_PAD_PLAYER), 2);
+    gui::Notify(pad, IDC_PAD_PLAYER, CBN_SELCHANGE);
+    EXPECT_EQ(ControlText(pad, IDC_PAD_EDIT_FIRST + 16), input::PadButtonName(30));
+    const input::InputSlot& slot = tool.App().Input()->GetSlot(0);
+    EXPECT_EQ(slot.joyMap[16], 30u) << "slot 0 reads the shown player's buttons";
+    EXPECT_EQ(slot.joystickIndex, 7);
+
+    gui::Notify(keyboard, IDC_KEYBOARD_RESET);
+    gui::Notify(pad, IDC_PAD_RESET);
+    config::CSaveConfig expected;
+    expected.ResetAll();
+    Shuffle(expected);
+    expected.ResetKeyboardKeys();
+    expected.ResetPadButtons(2);
+    EXPECT_EQ(tool.Record().SaveToBytes(), expected.SaveToBytes());
+    const config::ConfigKeys& keys = *expected.Keys();
+    EXPECT_EQ(ControlText(keyboard, IDC_KEYBOARD_EDIT_FIRST + 14),
+              input::KeyName(keys.keyboardKeys[14]));
+    EXPECT_EQ(ControlText(pad, IDC_PAD_EDIT_FIRST + 16),
+              input::PadButtonName(keys.padConfigs[2].buttons[16]));
+}
+
+TEST(KeyPages, TheEditTakingTheFocusNamesTheFocusedActionOnEitherPage)
+{
+    RunningTool tool;
+    gui::ClickTab(tool.App().MainTab(), kKeyConfigPageIndex);
+    SetFocus(GetDlgItem(tool.KeyPage(kKeyboardPageIndex), IDC_KEYBOARD_EDIT_FIRST + 14));
+    EXPECT_EQ(tool.App().FocusedAction(), 14);
+    gui::ClickTab(tool.App().KeyTab(), kPadPageIndex);
+    SetFocus(GetDlgItem(tool.KeyPage(kPadPageIndex), IDC_PAD_EDIT_FIRST + 23));
+    EXPECT_EQ(tool.App().FocusedAction(), 23);
+}
