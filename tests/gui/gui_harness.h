@@ -12,6 +12,7 @@
 #include <commctrl.h>
 #include <functional>
 #include <gtest/gtest.h>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -26,17 +27,13 @@ inline std::string ControlText(HWND dialog, int id)
 }
 
 // A CBT hook on the test's thread for the scope. A later hook runs first.
-class CbtHook
+struct CbtHook : std::unique_ptr<HHOOK__, BOOL(WINAPI*)(HHOOK)>
 {
-public:
     explicit CbtHook(HOOKPROC procedure)
-        : hook_(SetWindowsHookExA(WH_CBT, procedure, nullptr, GetCurrentThreadId()))
+        : unique_ptr(SetWindowsHookExA(WH_CBT, procedure, nullptr, GetCurrentThreadId()),
+                     UnhookWindowsHookEx)
     {
     }
-    ~CbtHook() { UnhookWindowsHookEx(hook_); }
-
-private:
-    HHOOK hook_;
 };
 
 // The caption and text of each message box that AnswerMessageBox answered

@@ -9,23 +9,18 @@
 #include <windowsx.h>
 
 using gui::ControlText;
-using gui::RunningTool;
 
-namespace
+TEST(KeyPages, ShowTheShownPlayersCodesResetThemAndNameTheFocusedAction)
 {
-void Shuffle(config::CSaveConfig& record)
-{
-    config::ConfigKeys& keys = *record.Keys();
-    keys.keyboardKeys[14] = 0x2D;
-    keys.padConfigs[0].buttons[16] = 14;
-    keys.padConfigs[2].buttons[16] = 30;
-    keys.padConfigs[2].device = 7;
-}
-} // namespace
-
-TEST(KeyPages, ShowTheShownPlayersCodesAndResetOnlyThem)
-{
-    RunningTool tool(Shuffle);
+    const auto shuffle = [](config::CSaveConfig& record)
+    {
+        config::ConfigKeys& keys = *record.Keys();
+        keys.keyboardKeys[14] = 0x2D;
+        keys.padConfigs[0].buttons[16] = 14;
+        keys.padConfigs[2].buttons[16] = 30;
+        keys.padConfigs[2].device = 7;
+    };
+    gui::RunningTool tool(shuffle);
     const HWND keyboard = tool.KeyPage(kKeyboardPageIndex);
     const HWND pad = tool.KeyPage(kPadPageIndex);
     EXPECT_EQ(ControlText(keyboard, IDC_KEYBOARD_EDIT_FIRST + 14), input::KeyName(0x2D));
@@ -42,24 +37,17 @@ TEST(KeyPages, ShowTheShownPlayersCodesAndResetOnlyThem)
     gui::Notify(pad, IDC_PAD_RESET);
     config::CSaveConfig expected;
     expected.ResetAll();
-    Shuffle(expected);
+    shuffle(expected);
     expected.ResetKeyboardKeys();
     expected.ResetPadButtons(2);
     EXPECT_EQ(tool.Record().SaveToBytes(), expected.SaveToBytes());
-    const config::ConfigKeys& keys = *expected.Keys();
-    EXPECT_EQ(ControlText(keyboard, IDC_KEYBOARD_EDIT_FIRST + 14),
-              input::KeyName(keys.keyboardKeys[14]));
     EXPECT_EQ(ControlText(pad, IDC_PAD_EDIT_FIRST + 16),
-              input::PadButtonName(keys.padConfigs[2].buttons[16]));
-}
+              input::PadButtonName(expected.Keys()->padConfigs[2].buttons[16]));
 
-TEST(KeyPages, TheEditTakingTheFocusNamesTheFocusedActionOnEitherPage)
-{
-    RunningTool tool;
     gui::ClickTab(tool.App().MainTab(), kKeyConfigPageIndex);
-    SetFocus(GetDlgItem(tool.KeyPage(kKeyboardPageIndex), IDC_KEYBOARD_EDIT_FIRST + 14));
+    SetFocus(GetDlgItem(keyboard, IDC_KEYBOARD_EDIT_FIRST + 14));
     EXPECT_EQ(tool.App().FocusedAction(), 14);
     gui::ClickTab(tool.App().KeyTab(), kPadPageIndex);
-    SetFocus(GetDlgItem(tool.KeyPage(kPadPageIndex), IDC_PAD_EDIT_FIRST + 23));
+    SetFocus(GetDlgItem(pad, IDC_PAD_EDIT_FIRST + 23));
     EXPECT_EQ(tool.App().FocusedAction(), 23);
 }

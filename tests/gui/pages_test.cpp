@@ -1,6 +1,7 @@
 // How the pages are wired to the record: each control shows its field at
 // start and writes it when the user changes it; the tabs show their pages,
 // and every page fits its tab.
+#include "config/fixed_text.h"
 #include "resources/resource.h"
 #include "tests/gui/gui_harness.h"
 
@@ -15,13 +16,14 @@ namespace
 enum Kind
 {
     kCheck,
-    kInvertedCheck, // checked while the field is 0
+    kInvertedCheck,
     kChoice,
     kSlider,
-    kEdit,
+    kEdit
 };
 
 // By kind: the field's value at start, then the value the user changes it to.
+// An inverted check box is checked while its field is 0.
 const char* const kValues[][2] = {
     {"1", "0"}, {"0", "1"}, {"1", "0"}, {"-1230", "-20"}, {"4321", "18001"}};
 
@@ -39,10 +41,10 @@ struct Field
     }
     std::string Get() const
     {
-        const auto* text = reinterpret_cast<const char*>(data);
         std::int32_t number = 0;
         std::memcpy(&number, data, size > 4 ? 0 : size);
-        return size > 4 ? std::string(text, strnlen(text, size)) : std::to_string(number);
+        return size > 4 ? config::FieldText(reinterpret_cast<const char*>(data), size)
+                        : std::to_string(number);
     }
 };
 
@@ -63,32 +65,17 @@ constexpr int kNetwork = 2;
 constexpr int kChatRow = IDC_RADIO_CHAT_ROW_STEP * (config::kRadioChatCount - 1);
 constexpr int kMusicRow = IDC_MUSIC_ROW_STEP * (config::kUserBgmRowCount - 1);
 
+// One control of each kind on each page.
 const Wiring kWirings[] = {
     {kGraphicsPageIndex, IDC_SCREEN_SIZE, kChoice, FIELD(Graphics()->screenSize)},
-    {kGraphicsPageIndex, IDC_HDR_LEVEL, kChoice, FIELD(Graphics()->hdrLevel)},
-    {kGraphicsPageIndex, IDC_TRAIL_QUALITY, kChoice, FIELD(Graphics()->trailQuality)},
     {kGraphicsPageIndex, IDC_FULL_SCREEN, kCheck, FIELD(Graphics()->fullScreen)},
-    {kGraphicsPageIndex, IDC_SHOW_MOVIE, kCheck, FIELD(Graphics()->showMovie)},
-    {kGamePageIndex, IDC_VOICE_PLAYBACK, kCheck, FIELD(Game()->voicePlayback)},
     {kGamePageIndex, IDC_CAPTURE_ENABLED, kCheck, FIELD(Game()->captureEnabled)},
-    {kGamePageIndex, IDC_PAD_VIBRATION, kCheck, FIELD(Game()->padVibration)},
-    {kGamePageIndex, IDC_SCREEN_SHAKE, kCheck, FIELD(Game()->screenShake)},
-    {kGamePageIndex, IDC_BGM_VOLUME, kSlider, FIELD(Game()->bgmVolume)},
     {kGamePageIndex, IDC_SE_VOLUME, kSlider, FIELD(Game()->seVolume)},
-    {kGamePageIndex, IDC_VOICE_VOLUME, kSlider, FIELD(Game()->voiceVolume)},
-    {kGamePageIndex, IDC_RADAR_TYPE, kChoice, FIELD(Game()->radarType)},
-    {kGamePageIndex, IDC_ARCADE_DIFFICULTY, kChoice, FIELD(Game()->arcadeDifficulty)},
-    {kGamePageIndex, IDC_GUARD_CORRECTION, kChoice, FIELD(Game()->guardCorrection)},
-    {kGamePageIndex, IDC_CAMERA_POSITION, kChoice, FIELD(Game()->cameraPosition)},
     {kGamePageIndex, IDC_LOCK_ON_TYPE, kChoice, FIELD(Game()->lockOnType)},
-    {kGamePageIndex, IDC_CAPTURE_SIZE, kChoice, FIELD(Game()->captureSize)},
-    {kNetwork, IDC_NETWORK_USE_UPNP, kCheck, FIELD(Network()->useUpnp)},
     {kNetwork, IDC_NETWORK_PLAY_BGM, kCheck, FIELD(Network()->playBgm)},
     {kNetwork, IDC_NETWORK_KEY_RESPONSE, kChoice, FIELD(Network()->keyResponse)},
     {kNetwork, IDC_NETWORK_PORT, kEdit, FIELD(Network()->port)},
-    {kNetwork, IDC_NETWORK_LOBBY_ID, kEdit, FIELD(Network()->lobbyId)},
     {kNetwork, IDC_NETWORK_DIRECT_ID, kEdit, FIELD(Network()->directId)},
-    {kReplayPageIndex, IDC_SAVE_REPLAYS, kCheck, FIELD(Replay()->saveReplays)},
     {kReplayPageIndex, IDC_SAVE_REPLAYS + 30, kCheck, FIELD(Replay()->replayLock[29])},
     {kRadioChatPageIndex, IDC_RADIO_CHAT_TEXT_FIRST + kChatRow, kEdit,
      FIELD(RadioChat()->entries[11].text)},
@@ -172,17 +159,16 @@ TEST(Pages, EveryVisibleControlOfEveryPageLiesInsideItsTab)
         const bool keyPage = index >= kPageCount;
         const HWND page = keyPage ? tool.KeyPage(index - kPageCount) : tool.Page(index);
         const HWND tab = keyPage ? tool.App().KeyTab() : tool.App().MainTab();
-        RECT inside;
+        RECT inside, rect, both;
         GetClientRect(tab, &inside);
         MapWindowPoints(tab, nullptr, reinterpret_cast<POINT*>(&inside), 2);
-        for (HWND control = GetWindow(page, GW_CHILD); control != nullptr;
+        for (HWND control = GetWindow(page, GW_CHILD); control;
              control = GetWindow(control, GW_HWNDNEXT))
         {
-            RECT rect;
             GetWindowRect(control, &rect);
-            const bool shown = (GetWindowLongPtrA(control, GWL_STYLE) & WS_VISIBLE) != 0;
-            EXPECT_TRUE(!shown || (rect.left >= inside.left && rect.right <= inside.right &&
-                                   rect.top >= inside.top && rect.bottom <= inside.bottom))
+            UnionRect(&both, &inside, &rect);
+            EXPECT_TRUE((GetWindowLongPtrA(control, GWL_STYLE) & WS_VISIBLE) == 0 ||
+                        EqualRect(&both, &inside))
                 << "control " << GetDlgCtrlID(control) << " of page " << index;
         }
     }
