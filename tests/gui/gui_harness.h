@@ -1,12 +1,10 @@
 #pragma once
 
-// Runs the tool's own start-up inside the test process, with TEMP in a folder
-// of the test's own, and drives its pages by the messages a user's actions
-// produce. Dialogs the tool opens are answered from CBT hooks.
+// The tool's own start-up run inside the test process, with TEMP in a folder
+// of the test's own; its pages get the messages a user's actions produce.
 
 #include "app/config_application.h"
 #include "app/system.h"
-#include "base/win32.h"
 #include "tests/support/temp_folder.h"
 
 #include <commctrl.h>
@@ -36,8 +34,7 @@ struct CbtHook : std::unique_ptr<HHOOK__, BOOL(WINAPI*)(HHOOK)>
     }
 };
 
-// The caption and text of each message box that AnswerMessageBox answered
-// with OK.
+// The caption and text of each message box AnswerMessageBox answered (OK).
 inline std::vector<std::pair<std::string, std::string>> messageBoxes;
 
 inline LRESULT CALLBACK AnswerMessageBox(int code, WPARAM wParam, LPARAM lParam)
@@ -55,7 +52,7 @@ inline LRESULT CALLBACK AnswerMessageBox(int code, WPARAM wParam, LPARAM lParam)
 
 // The application object after its Init, started from a settings file of the
 // defaults with `edit` applied. Destroying it closes the dialog and runs Exit.
-class RunningTool
+class RunningTool : public CConfigApplication
 {
 public:
     explicit RunningTool(const std::function<void(config::CSaveConfig&)>& edit = nullptr)
@@ -66,28 +63,22 @@ public:
             edit(record);
         std::filesystem::create_directories(folder_.SaveDirectory());
         testing_support::WriteBytes(folder_.SettingsFile(), record.SaveToBytes());
-        SetApplication(&application_);
-        EXPECT_TRUE(application_.Init(GetModuleHandleA(nullptr), AppWindowProc));
+        SetApplication(this);
+        EXPECT_TRUE(Init(GetModuleHandleA(nullptr), AppWindowProc));
     }
     ~RunningTool()
     {
-        if (application_.System() != nullptr)
-            DestroyWindow(application_.System()->GetHwnd());
+        if (System() != nullptr)
+            DestroyWindow(System()->GetHwnd());
         // The quit message it posted would end the next test's modal loops.
         for (MSG message; PeekMessageA(&message, nullptr, 0, 0, PM_REMOVE);)
             continue;
-        application_.Exit();
+        Exit();
         SetApplication(nullptr);
     }
 
-    CConfigApplication& App() { return application_; }
-    config::CSaveConfig& Record() { return *application_.Record(); }
-    HWND Page(int index) { return application_.PageWindow(index); }
-    HWND KeyPage(int index) { return application_.KeyPageWindow(index); }
-
 private:
     testing_support::TempSaveFolder folder_;
-    CConfigApplication application_;
 };
 
 // A user's click on a tab of the main tab or the key tab.

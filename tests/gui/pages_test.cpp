@@ -1,10 +1,9 @@
 // How the pages are wired to the record: each control shows its field at
-// start and writes it when the user changes it; the tabs show their pages,
-// and every page fits its tab.
-#include "config/fixed_text.h"
+// start and writes it when the user changes it; and every page fits its tab.
 #include "resources/resource.h"
 #include "tests/gui/gui_harness.h"
 
+#include <cstdio>
 #include <cstring>
 #include <windowsx.h>
 
@@ -13,51 +12,41 @@ using gui::RunningTool;
 namespace
 {
 
-enum Kind
-{
-    kCheck,
-    kInvertedCheck,
-    kChoice,
-    kSlider,
-    kEdit
-};
+// Kinds of control, by their row in kValues.
+constexpr int kCheck = 0, kInvertedCheck = 1, kChoice = 2, kSlider = 3, kEdit = 4;
 
 // By kind: the field's value at start, then the value the user changes it to.
 // An inverted check box is checked while its field is 0.
-const char* const kValues[][2] = {
-    {"1", "0"}, {"0", "1"}, {"1", "0"}, {"-1230", "-20"}, {"4321", "18001"}};
+constexpr int kValues[][2] = {{1, 0}, {0, 1}, {1, 0}, {-1230, -20}, {4321, 18001}};
 
-// A field of the record; one wider than a number holds text.
+// A field of the record; one wider than a number holds its number as text.
 struct Field
 {
-    std::uint8_t* data;
+    void* data;
     std::size_t size;
 
-    void Put(const std::string& value) const
+    void Put(int value) const
     {
-        const std::int32_t number = size > 4 ? 0 : std::stoi(value);
-        std::memcpy(data, size > 4 ? value.c_str() : static_cast<const void*>(&number),
-                    size > 4 ? value.size() + 1 : size);
+        if (size > 4)
+            std::snprintf(static_cast<char*>(data), size, "%d", value);
+        else
+            std::memcpy(data, &value, size);
     }
-    std::string Get() const
+    int Get() const
     {
-        std::int32_t number = 0;
-        std::memcpy(&number, data, size > 4 ? 0 : size);
-        return size > 4 ? config::FieldText(reinterpret_cast<const char*>(data), size)
-                        : std::to_string(number);
+        int value = 0;
+        std::memcpy(&value, data, size > 4 ? 0 : size);
+        return size > 4 ? std::atoi(static_cast<const char*>(data)) : value;
     }
 };
 
-#define FIELD(member)                                                                              \
-    [](config::CSaveConfig& r) {                                                                   \
-        return Field{reinterpret_cast<std::uint8_t*>(&r.member), sizeof r.member};                 \
-    }
+#define FIELD(m) [](config::CSaveConfig& r) { return Field{&r.m, sizeof r.m}; }
 
 struct Wiring
 {
     int page;
     int id;
-    Kind kind;
+    int kind;
     Field (*field)(config::CSaveConfig&);
 };
 
@@ -75,7 +64,6 @@ const Wiring kWirings[] = {
     {kNetwork, IDC_NETWORK_PLAY_BGM, kCheck, FIELD(Network()->playBgm)},
     {kNetwork, IDC_NETWORK_KEY_RESPONSE, kChoice, FIELD(Network()->keyResponse)},
     {kNetwork, IDC_NETWORK_PORT, kEdit, FIELD(Network()->port)},
-    {kNetwork, IDC_NETWORK_DIRECT_ID, kEdit, FIELD(Network()->directId)},
     {kReplayPageIndex, IDC_SAVE_REPLAYS + 30, kCheck, FIELD(Replay()->replayLock[29])},
     {kRadioChatPageIndex, IDC_RADIO_CHAT_TEXT_FIRST + kChatRow, kEdit,
      FIELD(RadioChat()->entries[11].text)},
@@ -83,33 +71,30 @@ const Wiring kWirings[] = {
      FIELD(RadioChat()->entries[11].notToAll)},
     {kUserMusicPageIndex, IDC_MUSIC_PATH_FIRST + kMusicRow, kEdit,
      FIELD(UserBgm()->rows[9].musicPath)},
-    {kUserMusicPageIndex, IDC_TENSION_PATH_FIRST + kMusicRow, kEdit,
-     FIELD(UserBgm()->rows[9].tensionPath)},
 };
 
 // What the control shows, in the field's terms.
-std::string Shows(HWND page, const Wiring& wiring)
+int Shows(HWND page, const Wiring& wiring)
 {
-    const bool checked = IsDlgButtonChecked(page, wiring.id) == BST_CHECKED;
     if (wiring.kind == kCheck || wiring.kind == kInvertedCheck)
-        return checked == (wiring.kind == kCheck) ? "1" : "0";
+        return (IsDlgButtonChecked(page, wiring.id) == BST_CHECKED) == (wiring.kind == kCheck);
     if (wiring.kind == kEdit)
-        return gui::ControlText(page, wiring.id);
+        return std::atoi(gui::ControlText(page, wiring.id).c_str());
     const UINT get = wiring.kind == kChoice ? CB_GETCURSEL : TBM_GETPOS;
-    return std::to_string(SendDlgItemMessageA(page, wiring.id, get, 0, 0));
+    return static_cast<int>(SendDlgItemMessageA(page, wiring.id, get, 0, 0));
 }
 
 // The user's change: the control takes its new state and tells its page.
 void Change(HWND page, const Wiring& wiring)
 {
     const HWND control = GetDlgItem(page, wiring.id);
-    const char* value = kValues[wiring.kind][1];
+    const int value = kValues[wiring.kind][1];
     if (wiring.kind == kChoice)
-        ComboBox_SetCurSel(control, std::stoi(value));
+        ComboBox_SetCurSel(control, value);
     else if (wiring.kind == kSlider)
-        SendMessageA(control, TBM_SETPOS, TRUE, std::stoi(value));
-    else if (wiring.kind == kEdit)
-        SetWindowTextA(control, value); // a single-line edit tells its page by itself
+        SendMessageA(control, TBM_SETPOS, TRUE, value);
+    else if (wiring.kind == kEdit) // a single-line edit tells its page by itself
+        SetWindowTextA(control, std::to_string(value).c_str());
     else
         Button_SetCheck(control, BST_UNCHECKED); // every box starts checked
     if (wiring.kind == kSlider)
@@ -129,26 +114,13 @@ TEST(Pages, EachControlShowsItsFieldAtStartAndWritesItWhenChanged)
                 wiring.field(record).Put(kValues[wiring.kind][0]);
         });
     for (const Wiring& wiring : kWirings)
-        EXPECT_EQ(Shows(tool.Page(wiring.page), wiring), kValues[wiring.kind][0]) << wiring.id;
+        EXPECT_EQ(Shows(tool.PageWindow(wiring.page), wiring), kValues[wiring.kind][0])
+            << wiring.id;
     for (const Wiring& wiring : kWirings)
     {
-        Change(tool.Page(wiring.page), wiring);
-        EXPECT_EQ(wiring.field(tool.Record()).Get(), kValues[wiring.kind][1]) << wiring.id;
+        Change(tool.PageWindow(wiring.page), wiring);
+        EXPECT_EQ(wiring.field(*tool.Record()).Get(), kValues[wiring.kind][1]) << wiring.id;
     }
-}
-
-TEST(Pages, ATabShowsItsPageAloneAndTheKeyTabItsSubPage)
-{
-    RunningTool tool;
-    for (int index : {6, 2, kKeyConfigPageIndex})
-    {
-        gui::ClickTab(tool.App().MainTab(), index);
-        for (int other = 0; other < kPageCount; ++other)
-            EXPECT_EQ(IsWindowVisible(tool.Page(other)) != FALSE, other == index) << other;
-    }
-    gui::ClickTab(tool.App().KeyTab(), kPadPageIndex);
-    EXPECT_TRUE(IsWindowVisible(tool.KeyPage(kPadPageIndex)));
-    EXPECT_FALSE(IsWindowVisible(tool.KeyPage(kKeyboardPageIndex)));
 }
 
 TEST(Pages, EveryVisibleControlOfEveryPageLiesInsideItsTab)
@@ -157,11 +129,10 @@ TEST(Pages, EveryVisibleControlOfEveryPageLiesInsideItsTab)
     for (int index = 0; index < kPageCount + kKeyPageCount; ++index)
     {
         const bool keyPage = index >= kPageCount;
-        const HWND page = keyPage ? tool.KeyPage(index - kPageCount) : tool.Page(index);
-        const HWND tab = keyPage ? tool.App().KeyTab() : tool.App().MainTab();
+        const HWND page = keyPage ? tool.KeyPageWindow(index - kPageCount) : tool.PageWindow(index);
+        const HWND tab = keyPage ? tool.KeyTab() : tool.MainTab();
         RECT inside, rect, both;
-        GetClientRect(tab, &inside);
-        MapWindowPoints(tab, nullptr, reinterpret_cast<POINT*>(&inside), 2);
+        GetWindowRect(tab, &inside);
         for (HWND control = GetWindow(page, GW_CHILD); control;
              control = GetWindow(control, GW_HWNDNEXT))
         {

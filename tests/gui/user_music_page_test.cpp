@@ -48,11 +48,10 @@ TEST(UserMusicPage, ADropTheCheckAndBrowsingEachServeTheirRow)
     for (const char* name : {"b.wav", "b.txt"})
         testing_support::WriteBytes(folder.File(name), {'b'});
     gui::RunningTool tool;
-    const HWND page = tool.Page(kUserMusicPageIndex);
-    const config::UserBgmRow& row = tool.Record().UserBgm()->rows[kRow];
+    const HWND page = tool.PageWindow(kUserMusicPageIndex);
+    const config::UserBgmRow& row = tool.Record()->UserBgm()->rows[kRow];
 
-    // What the shell hands the edit: a DROPFILES header, then the names, each
-    // ending in a zero, and one more zero.
+    // A drop as the shell hands it: DROPFILES, then names ending in zeros.
     const std::string names = music + '\0' + folder.File("b.wav") + '\0' + '\0';
     const HGLOBAL drop = GlobalAlloc(GHND, sizeof(DROPFILES) + names.size());
     auto* header = static_cast<DROPFILES*>(GlobalLock(drop));
@@ -83,6 +82,6 @@ TEST(UserMusicPage, ADropTheCheckAndBrowsingEachServeTheirRow)
     EXPECT_EQ(config::FieldText(row.tensionPath), folder.File("b.txt"));
     EXPECT_EQ(gui::ControlText(page, IDC_TENSION_PATH_FIRST + IDC_MUSIC_ROW_STEP * kRow),
               folder.File("b.txt"));
-    EXPECT_TRUE(IsWindowEnabled(tool.App().System()->GetHwnd()));
+    EXPECT_TRUE(IsWindowEnabled(tool.System()->GetHwnd()));
     EXPECT_EQ(std::filesystem::current_path(), programFolder);
 }
