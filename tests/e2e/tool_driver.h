@@ -36,7 +36,7 @@ class ToolProcess
 {
 public:
     // Starts the tool that lies beside the test executable, with the test's
-    // own environment.
+    // own environment: a TempSaveFolder made before gives it its TEMP.
     ToolProcess();
     ~ToolProcess();
     ToolProcess(const ToolProcess&) = delete;

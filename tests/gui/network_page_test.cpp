@@ -16,9 +16,9 @@ namespace
 constexpr int kNetworkPage = 2;
 constexpr char kOctetMessage[] = "IPアドレスには0～255までの数字を入力してください。";
 
-// Typed each into the next IP entry dialog; without one left the dialog is
-// cancelled. Installed after AnswerMessageBox, the hook runs first and keeps
-// the dialog (its labels carry a message box text's id) from reaching it.
+// The addresses to type, one into each IP entry dialog shown; with none left
+// the dialog is cancelled. Installed after AnswerMessageBox, this hook runs
+// first and keeps the dialog (its labels have a box text's id) from it.
 std::deque<std::array<const char*, 4>> addresses;
 
 LRESULT CALLBACK TypeAddress(int code, WPARAM wParam, LPARAM lParam)
