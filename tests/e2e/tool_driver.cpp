@@ -1,236 +1,18 @@
 #include "tests/e2e/tool_driver.h"
 
 #include <cstring>
-#include <fstream>
-#include <iterator>
 
 namespace e2e
 {
-namespace
-{
 
-std::string ExecutableDirectory()
+bool WaitFor(const std::function<bool()>& done, DWORD timeoutMs)
 {
-    char path[MAX_PATH] = {};
-    GetModuleFileNameA(nullptr, path, sizeof path);
-    std::string directory(path);
-    return directory.substr(0, directory.find_last_of('\\') + 1);
-}
-
-// The test's own environment with TEMP replaced, as a CreateProcess block.
-std::vector<char> EnvironmentWithTemp(const std::string& temp)
-{
-    std::vector<char> block;
-    char* strings = GetEnvironmentStringsA();
-    for (const char* entry = strings; *entry != '\0'; entry += std::strlen(entry) + 1)
+    for (const DWORD start = GetTickCount(); !done(); Sleep(20))
     {
-        if (_strnicmp(entry, "TEMP=", 5) == 0)
-            continue;
-        block.insert(block.end(), entry, entry + std::strlen(entry) + 1);
-    }
-    FreeEnvironmentStringsA(strings);
-    const std::string own = "TEMP=" + temp;
-    block.insert(block.end(), own.c_str(), own.c_str() + own.size() + 1);
-    block.push_back('\0');
-    return block;
-}
-
-bool IsDialog(HWND window)
-{
-    char className[16] = {};
-    GetClassNameA(window, className, sizeof className);
-    return std::strcmp(className, "#32770") == 0;
-}
-
-void RemoveTree(const std::string& path)
-{
-    WIN32_FIND_DATAA found;
-    HANDLE search = FindFirstFileA((path + "\\*").c_str(), &found);
-    if (search != INVALID_HANDLE_VALUE)
-    {
-        do
-        {
-            const std::string name = found.cFileName;
-            if (name == "." || name == "..")
-                continue;
-            const std::string child = path + "\\" + name;
-            if (found.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY)
-                RemoveTree(child);
-            else
-                DeleteFileA(child.c_str());
-        } while (FindNextFileA(search, &found));
-        FindClose(search);
-    }
-    RemoveDirectoryA(path.c_str());
-}
-
-template <typename Predicate> bool WaitUntil(DWORD timeoutMs, Predicate predicate)
-{
-    const DWORD start = GetTickCount();
-    for (;;)
-    {
-        if (predicate())
-            return true;
         if (GetTickCount() - start > timeoutMs)
             return false;
-        Sleep(20);
     }
-}
-
-} // namespace
-
-SaveFolder::SaveFolder()
-{
-    static int counter = 0;
-    char temp[MAX_PATH] = {};
-    GetTempPathA(sizeof temp, temp);
-    root_ = std::string(temp) + "vek-e2e-" + std::to_string(GetCurrentProcessId()) + "-" +
-            std::to_string(counter++);
-    CreateDirectoryA(root_.c_str(), nullptr);
-    CreateDirectoryA(Temp().c_str(), nullptr);
-}
-
-SaveFolder::~SaveFolder()
-{
-    RemoveTree(root_);
-}
-
-ToolProcess::ToolProcess(const SaveFolder& folder)
-{
-    std::string command = "\"" + ExecutableDirectory() + "VEKConfig.exe\"";
-    std::vector<char> environment = EnvironmentWithTemp(folder.Temp());
-    STARTUPINFOA startup = {};
-    startup.cb = sizeof startup;
-    if (!CreateProcessA(nullptr, command.data(), nullptr, nullptr, FALSE, 0, environment.data(),
-                        nullptr, &startup, &process_))
-        process_ = {};
-}
-
-ToolProcess::~ToolProcess()
-{
-    if (!Started())
-        return;
-    if (IsRunning())
-    {
-        TerminateProcess(process_.hProcess, 99);
-        WaitForSingleObject(process_.hProcess, 5000);
-    }
-    CloseHandle(process_.hThread);
-    CloseHandle(process_.hProcess);
-}
-
-std::vector<HWND> ToolProcess::TopLevelDialogs()
-{
-    struct Search
-    {
-        DWORD processId;
-        std::vector<HWND> found;
-    } search{process_.dwProcessId, {}};
-    EnumWindows(
-        [](HWND window, LPARAM parameter) -> BOOL
-        {
-            auto* s = reinterpret_cast<Search*>(parameter);
-            DWORD owner = 0;
-            GetWindowThreadProcessId(window, &owner);
-            if (owner == s->processId && IsWindowVisible(window) && IsDialog(window))
-                s->found.push_back(window);
-            return TRUE;
-        },
-        reinterpret_cast<LPARAM>(&search));
-    return search.found;
-}
-
-HWND ToolProcess::WaitForMainDialog(DWORD timeoutMs)
-{
-    HWND main = nullptr;
-    WaitUntil(timeoutMs,
-              [&]
-              {
-                  for (HWND window : TopLevelDialogs())
-                  {
-                      if (GetDlgItem(window, IDOK) != nullptr &&
-                          GetDlgItem(window, 0xFFFF) == nullptr)
-                          main = window;
-                  }
-                  return main != nullptr;
-              });
-    return main;
-}
-
-HWND ToolProcess::WaitForMessageBox(DWORD timeoutMs)
-{
-    HWND box = nullptr;
-    WaitUntil(timeoutMs,
-              [&]
-              {
-                  for (HWND window : TopLevelDialogs())
-                  {
-                      if (GetDlgItem(window, 0xFFFF) != nullptr)
-                          box = window;
-                  }
-                  return box != nullptr;
-              });
-    return box;
-}
-
-MessageBoxSeen ToolProcess::AnswerMessageBox(int answer, DWORD timeoutMs)
-{
-    MessageBoxSeen seen;
-    HWND box = WaitForMessageBox(timeoutMs);
-    if (box == nullptr)
-        return seen;
-    seen.found = true;
-    seen.caption = WindowText(box);
-    seen.text = WindowText(GetDlgItem(box, 0xFFFF));
-    PostMessageA(box, WM_COMMAND, MAKEWPARAM(answer, BN_CLICKED), 0);
-    // Hidden is answered: under Wine the box's window lingers for a while
-    // after the dialog has ended.
-    WaitUntil(timeoutMs, [&] { return !IsWindowVisible(box); });
-    return seen;
-}
-
-void ToolProcess::PostCommand(HWND dialog, int controlId)
-{
-    PostMessageA(dialog, WM_COMMAND, MAKEWPARAM(controlId, BN_CLICKED),
-                 reinterpret_cast<LPARAM>(GetDlgItem(dialog, controlId)));
-}
-
-void ToolProcess::PostClose(HWND dialog)
-{
-    PostMessageA(dialog, WM_SYSCOMMAND, SC_CLOSE, 0);
-}
-
-bool ToolProcess::WaitForExit(DWORD& exitCode, DWORD timeoutMs)
-{
-    if (!Started() || WaitForSingleObject(process_.hProcess, timeoutMs) != WAIT_OBJECT_0)
-        return false;
-    return GetExitCodeProcess(process_.hProcess, &exitCode) != 0;
-}
-
-bool ToolProcess::IsRunning()
-{
-    return Started() && WaitForSingleObject(process_.hProcess, 0) == WAIT_TIMEOUT;
-}
-
-HWND FindControl(HWND dialog, int id)
-{
-    struct Search
-    {
-        int id;
-        HWND found;
-    } search{id, nullptr};
-    EnumChildWindows(
-        dialog,
-        [](HWND window, LPARAM parameter) -> BOOL
-        {
-            auto* s = reinterpret_cast<Search*>(parameter);
-            if (GetDlgCtrlID(window) != s->id)
-                return TRUE;
-            s->found = window;
-            return FALSE;
-        },
-        reinterpret_cast<LPARAM>(&search));
-    return search.found;
+    return true;
 }
 
 std::string WindowText(HWND window)
@@ -240,17 +22,99 @@ std::string WindowText(HWND window)
     return text;
 }
 
-std::vector<std::uint8_t> ReadFileBytes(const std::string& path)
+HWND FindControl(HWND dialog, int id)
 {
-    std::ifstream in(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+    std::pair<int, HWND> search{id, nullptr};
+    EnumChildWindows(
+        dialog,
+        [](HWND window, LPARAM parameter) -> BOOL
+        {
+            auto* s = reinterpret_cast<std::pair<int, HWND>*>(parameter);
+            if (GetDlgCtrlID(window) == s->first)
+                s->second = window;
+            return s->second == nullptr;
+        },
+        reinterpret_cast<LPARAM>(&search));
+    return search.second;
 }
 
-bool WriteFileBytes(const std::string& path, const std::vector<std::uint8_t>& bytes)
+ToolProcess::ToolProcess()
 {
-    std::ofstream out(path, std::ios::binary | std::ios::trunc);
-    out.write(reinterpret_cast<const char*>(bytes.data()), std::streamsize(bytes.size()));
-    return bool(out);
+    char path[MAX_PATH] = {};
+    GetModuleFileNameA(nullptr, path, sizeof path);
+    std::string command =
+        "\"" + std::string(path, std::strrchr(path, '\\') + 1) + "VEKConfig.exe\"";
+    STARTUPINFOA startup = {};
+    startup.cb = sizeof startup;
+    CreateProcessA(nullptr, command.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &startup,
+                   &process_);
+}
+
+ToolProcess::~ToolProcess()
+{
+    if (process_.hProcess == nullptr)
+        return;
+    if (ExitCode(0) == STILL_ACTIVE)
+        TerminateProcess(process_.hProcess, 99);
+    CloseHandle(process_.hThread);
+    CloseHandle(process_.hProcess);
+}
+
+HWND ToolProcess::FindDialog(bool messageBox)
+{
+    struct Search
+    {
+        DWORD processId;
+        bool messageBox;
+        HWND found;
+    } search{process_.dwProcessId, messageBox, nullptr};
+    WaitFor(
+        [&]
+        {
+            EnumWindows(
+                [](HWND window, LPARAM parameter) -> BOOL
+                {
+                    auto* s = reinterpret_cast<Search*>(parameter);
+                    DWORD processId = 0;
+                    char className[16] = {};
+                    GetWindowThreadProcessId(window, &processId);
+                    GetClassNameA(window, className, sizeof className);
+                    if (processId == s->processId && IsWindowVisible(window) &&
+                        std::strcmp(className, "#32770") == 0 &&
+                        (GetDlgItem(window, 0xFFFF) != nullptr) == s->messageBox)
+                        s->found = window;
+                    return TRUE;
+                },
+                reinterpret_cast<LPARAM>(&search));
+            return search.found != nullptr;
+        });
+    return search.found;
+}
+
+HWND ToolProcess::MainDialog()
+{
+    return FindDialog(false);
+}
+
+MessageBoxSeen ToolProcess::AnswerMessageBox(int answer)
+{
+    const HWND box = FindDialog(true);
+    if (box == nullptr)
+        return {"(no message box)", "", nullptr};
+    MessageBoxSeen seen{WindowText(box), WindowText(GetDlgItem(box, 0xFFFF)),
+                        GetWindow(box, GW_OWNER)};
+    PostMessageA(box, WM_COMMAND, answer, 0);
+    // Under Wine the box's window lingers for a while after the box has ended.
+    WaitFor([&] { return !IsWindowVisible(box); });
+    return seen;
+}
+
+DWORD ToolProcess::ExitCode(DWORD timeoutMs)
+{
+    DWORD code = STILL_ACTIVE;
+    if (WaitForSingleObject(process_.hProcess, timeoutMs) == WAIT_OBJECT_0)
+        GetExitCodeProcess(process_.hProcess, &code);
+    return code;
 }
 
 } // namespace e2e

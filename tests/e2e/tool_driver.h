@@ -1,79 +1,60 @@
 #pragma once
 
-// Drives VEKConfig.exe from outside, as a user would: start it with a TEMP of
-// the test's own, find its windows, read their texts, press buttons, answer
-// its message boxes and read the settings file it writes.
+// Drives VEKConfig.exe from outside, as a user would: starts it with the
+// test's own TEMP, finds its windows, reads their texts, presses buttons and
+// answers its message boxes.
 
 #include "base/win32.h"
 
-#include <cstdint>
+#include <functional>
 #include <string>
-#include <vector>
 
 namespace e2e
 {
 
-// A folder of the test's own whose "Temp" subfolder is the tool's TEMP.
-class SaveFolder
+// Polls until `done` holds; false after the timeout.
+bool WaitFor(const std::function<bool()>& done, DWORD timeoutMs = 10000);
+
+std::string WindowText(HWND window);
+// A control anywhere below `dialog` (its pages included), by its id.
+HWND FindControl(HWND dialog, int id);
+
+// Posted, so that a message box the command opens does not block the test.
+inline void PostCommand(HWND dialog, int id)
 {
-public:
-    SaveFolder();
-    ~SaveFolder();
-    SaveFolder(const SaveFolder&) = delete;
-    SaveFolder& operator=(const SaveFolder&) = delete;
-
-    const std::string& Root() const { return root_; }
-    std::string Temp() const { return root_ + "\\Temp"; }
-    std::string SaveDirectory() const { return root_ + "\\Tolvenik\\VEK"; }
-    std::string SettingsFile() const { return SaveDirectory() + "\\GameConfig.dat"; }
-
-private:
-    std::string root_;
-};
+    PostMessageA(dialog, WM_COMMAND, id, 0);
+}
 
 struct MessageBoxSeen
 {
     std::string caption;
     std::string text;
-    bool found = false;
+    HWND owner = nullptr;
 };
 
 class ToolProcess
 {
 public:
-    // Starts the tool that lies beside the test executable.
-    explicit ToolProcess(const SaveFolder& folder);
+    // Starts the tool that lies beside the test executable, with the test's
+    // own environment: a TempSaveFolder made before gives it its TEMP.
+    ToolProcess();
     ~ToolProcess();
     ToolProcess(const ToolProcess&) = delete;
     ToolProcess& operator=(const ToolProcess&) = delete;
 
-    bool Started() const { return process_.hProcess != nullptr; }
-
-    // The main dialog once it is visible (null after the timeout).
-    HWND WaitForMainDialog(DWORD timeoutMs = 10000);
-    // A message box of the tool: a dialog with a static text of id 0xFFFF.
-    HWND WaitForMessageBox(DWORD timeoutMs = 10000);
-    // Reads a message box's caption and text, then presses `answer`.
-    MessageBoxSeen AnswerMessageBox(int answer, DWORD timeoutMs = 10000);
-
-    // Posted, so a message box the command opens does not block the test.
-    void PostCommand(HWND dialog, int controlId);
-    void PostClose(HWND dialog);
-
-    // True with the exit code once the process has ended.
-    bool WaitForExit(DWORD& exitCode, DWORD timeoutMs = 10000);
-    bool IsRunning();
+    // The main dialog once it is shown; null after the timeout.
+    HWND MainDialog();
+    // Reads the next message box the tool shows and presses `answer` in it.
+    MessageBoxSeen AnswerMessageBox(int answer);
+    // The exit code once the process has ended, else STILL_ACTIVE.
+    DWORD ExitCode(DWORD timeoutMs = 10000);
 
 private:
-    std::vector<HWND> TopLevelDialogs();
+    // A shown dialog of the tool: a message box (with a text of id 0xFFFF)
+    // or the main dialog.
+    HWND FindDialog(bool messageBox);
 
     PROCESS_INFORMATION process_{};
 };
-
-std::string WindowText(HWND window);
-// A control anywhere below `dialog` (its pages included), by its id.
-HWND FindControl(HWND dialog, int id);
-std::vector<std::uint8_t> ReadFileBytes(const std::string& path);
-bool WriteFileBytes(const std::string& path, const std::vector<std::uint8_t>& bytes);
 
 } // namespace e2e

@@ -1,14 +1,15 @@
 #pragma once
 
-// Runs the tool's own start-up inside the test process, with TEMP in a folder
-// of the test's own, and drives its dialogs by the messages a user's actions
-// produce. Message boxes are answered by a CBT hook and recorded.
+// The tool's own start-up run inside the test process, with TEMP in a folder
+// of the test's own; its pages get the messages a user's actions produce.
 
 #include "app/config_application.h"
-#include "base/win32.h"
+#include "app/system.h"
 #include "tests/support/temp_folder.h"
 
-#include <deque>
+#include <commctrl.h>
+#include <functional>
+#include <gtest/gtest.h>
 #include <memory>
 #include <string>
 #include <vector>
@@ -16,80 +17,83 @@
 namespace gui
 {
 
-struct MessageBoxSeen
+inline std::string ControlText(HWND dialog, int id)
 {
-    std::string caption;
-    std::string text;
+    char text[1024] = {};
+    GetDlgItemTextA(dialog, id, text, sizeof text);
+    return text;
+}
+
+// A CBT hook on the test's thread for the scope. A later hook runs first.
+struct CbtHook : std::unique_ptr<HHOOK__, BOOL(WINAPI*)(HHOOK)>
+{
+    explicit CbtHook(HOOKPROC procedure)
+        : unique_ptr(SetWindowsHookExA(WH_CBT, procedure, nullptr, GetCurrentThreadId()),
+                     UnhookWindowsHookEx)
+    {
+    }
 };
 
-// Answers every message box shown while it exists: the queued answers in
-// order, then `fallback`.
-class MessageBoxAnswerer
+// The caption and text of each message box AnswerMessageBox answered (OK).
+inline std::vector<std::pair<std::string, std::string>> messageBoxes;
+
+inline LRESULT CALLBACK AnswerMessageBox(int code, WPARAM wParam, LPARAM lParam)
+{
+    const HWND box = reinterpret_cast<HWND>(wParam);
+    if (code == HCBT_ACTIVATE && GetDlgItem(box, 0xFFFF) != nullptr)
+    {
+        char caption[256] = {};
+        GetWindowTextA(box, caption, sizeof caption);
+        messageBoxes.push_back({caption, ControlText(box, 0xFFFF)});
+        PostMessageA(box, WM_COMMAND, IDOK, 0);
+    }
+    return CallNextHookEx(nullptr, code, wParam, lParam);
+}
+
+// The application object after its Init, started from a settings file of the
+// defaults with `edit` applied. Destroying it closes the dialog and runs Exit.
+class RunningTool : public CConfigApplication
 {
 public:
-    explicit MessageBoxAnswerer(int fallback = IDOK);
-    ~MessageBoxAnswerer();
-    MessageBoxAnswerer(const MessageBoxAnswerer&) = delete;
-    MessageBoxAnswerer& operator=(const MessageBoxAnswerer&) = delete;
-
-    void Queue(int answer) { answers_.push_back(answer); }
-    const std::vector<MessageBoxSeen>& Seen() const { return seen_; }
-
-private:
-    static LRESULT CALLBACK Hook(int code, WPARAM wParam, LPARAM lParam);
-
-    HHOOK hook_;
-    int fallback_;
-    std::deque<int> answers_;
-    std::vector<MessageBoxSeen> seen_;
-};
-
-// The application object after its Init, with its settings file in a folder
-// of the test's own. Destroying it closes the dialog and runs Exit.
-class RunningTool
-{
-public:
-    RunningTool();
-    // Starts from this settings file instead of none.
-    explicit RunningTool(const std::vector<std::uint8_t>& settingsFile);
-    ~RunningTool();
-    RunningTool(const RunningTool&) = delete;
-    RunningTool& operator=(const RunningTool&) = delete;
-
-    bool Started() const { return started_; }
-    CConfigApplication& App() { return *application_; }
-    config::CSaveConfig& Record() { return *application_->Record(); }
-    HWND MainDialog();
-    HWND Page(int index) { return application_->PageWindow(index); }
-    HWND KeyPage(int index) { return application_->KeyPageWindow(index); }
-    HWND Control(HWND page, int id) { return GetDlgItem(page, id); }
-    std::string SettingsFile() const { return folder_.SettingsFile(); }
-
-    // Dispatches what is waiting, then runs one idle pass (Update, Render).
-    void Pump();
-
-    // A user's click on a main tab or key tab: selection and notification.
-    void ClickTab(int index);
-    void ClickKeyTab(int index);
-
-    // The notifications a user's action on a control sends its page.
-    void Click(HWND page, int id);                         // a button or check box
-    void SetCheck(HWND page, int id, bool on);             // a check box clicked into that state
-    void Choose(HWND page, int id, int index);             // a combo box selection
-    void Type(HWND page, int id, const std::string& text); // an edit's new text
-
-    // Presses 保存 and answers the closing question with `answer`.
-    std::vector<MessageBoxSeen> Save(int answer = IDNO);
+    explicit RunningTool(const std::function<void(config::CSaveConfig&)>& edit = nullptr)
+    {
+        config::CSaveConfig record;
+        record.ResetAll();
+        if (edit)
+            edit(record);
+        std::filesystem::create_directories(folder_.SaveDirectory());
+        testing_support::WriteBytes(folder_.SettingsFile(), record.SaveToBytes());
+        SetApplication(this);
+        EXPECT_TRUE(Init(GetModuleHandleA(nullptr), AppWindowProc));
+    }
+    ~RunningTool()
+    {
+        if (System() != nullptr)
+            DestroyWindow(System()->GetHwnd());
+        // The quit message it posted would end the next test's modal loops.
+        for (MSG message; PeekMessageA(&message, nullptr, 0, 0, PM_REMOVE);)
+            continue;
+        Exit();
+        SetApplication(nullptr);
+    }
 
 private:
-    void Start();
-
     testing_support::TempSaveFolder folder_;
-    std::unique_ptr<CConfigApplication> application_;
-    bool started_ = false;
 };
 
-std::string WindowText(HWND window);
-std::vector<std::uint8_t> ReadFile(const std::string& path);
+// A user's click on a tab of the main tab or the key tab.
+inline void ClickTab(HWND tab, int index)
+{
+    SendMessageA(tab, TCM_SETCURSEL, index, 0);
+    NMHDR header = {tab, static_cast<UINT_PTR>(GetDlgCtrlID(tab)), TCN_SELCHANGE};
+    SendMessageA(GetParent(tab), WM_NOTIFY, header.idFrom, reinterpret_cast<LPARAM>(&header));
+}
+
+// What a control tells its page when the user clicks or chooses in it.
+inline void Notify(HWND page, int id, int code = BN_CLICKED)
+{
+    SendMessageA(page, WM_COMMAND, MAKEWPARAM(id, code),
+                 reinterpret_cast<LPARAM>(GetDlgItem(page, id)));
+}
 
 } // namespace gui
