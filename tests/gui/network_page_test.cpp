@@ -110,4 +110,10 @@ TEST(NetworkPage, ConnectLinesStayWithTheirSlotsInAFileWithFreeSlotsBetween)
     EXPECT_EQ(config::ListedLine(slots[0]), "009.009.009.009");
     EXPECT_EQ(config::ListedLine(slots[1]), "001.001.001.001");
     EXPECT_TRUE(config::IsConnectSlotEmpty(slots[2]) && config::IsConnectSlotEmpty(slots[3]));
+
+    // An all-zero address is listed, but its slot stays free for the next.
+    Add(page, IDC_CONNECT_ADD, {{"0", "0", "0", "0"}});
+    EXPECT_EQ(LinesOf(page, IDC_CONNECT_LIST), (Lines{"9.9.9.9", "1.1.1.1", "0.0.0.0"}));
+    Add(page, IDC_CONNECT_ADD, {{"5", "5", "5", "5"}});
+    EXPECT_EQ(LinesOf(page, IDC_CONNECT_LIST), (Lines{"9.9.9.9", "1.1.1.1", "5.5.5.5"}));
 }
