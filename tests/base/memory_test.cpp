@@ -6,6 +6,7 @@
 
 TEST(Memory, BlocksAreAlignedAndZeroedUntilAPlannedFailure)
 {
+    delete new base::CAllocated();
     base::ScopedAllocationFailure failure(3);
     for (std::size_t size : {1u, 17u, 4096u})
     {
@@ -16,4 +17,5 @@ TEST(Memory, BlocksAreAlignedAndZeroedUntilAPlannedFailure)
         base::FreeBlock(block);
     }
     EXPECT_EQ(base::AllocateZeroed(8), nullptr);
+    EXPECT_THROW(new base::CAllocated(), std::bad_alloc);
 }

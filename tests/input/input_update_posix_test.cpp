@@ -48,15 +48,16 @@ TEST_F(InputUpdate, AHeldKeyPressesOnceOnEverySlotCountsItsTimeAndSteersTheStick
     in.SetFrameTime(16);
     Devices().mouse.rgbButtons[1] = 0x80;
     Devices().mouse.lZ = 120;
-    Devices().cursorX = 200;
+    Devices().cursorY = -5;
     const int w = kFirstVirtualButton + 4;
     const std::uint32_t held[] = {1, 1, 1, 0, 0}, heldTime[] = {0, 16, 32, 0, 0};
     for (int n = 0; n < 5; ++n)
     {
         Devices().keys[kW] = held[n] != 0 ? 0x80 : 0;
+        Devices().cursorX = n == 0 ? 5.0f : 200.0f; // first inside the box around (0, 0)
         in.Update();
         EXPECT_EQ(in.IsKeyTriggered(kW), n == 0 ? 1 : 0);
-        for (const std::uint8_t s : {0, 15})
+        for (const std::uint8_t s : {3, 4})
         {
             const InputSlot& slot = in.GetSlot(s);
             EXPECT_EQ(slot.pressed[w] + 2 * slot.released[w], n == 0 ? 1u : n == 3 ? 2u : 0u);
@@ -64,7 +65,7 @@ TEST_F(InputUpdate, AHeldKeyPressesOnceOnEverySlotCountsItsTimeAndSteersTheStick
             EXPECT_EQ(slot.upTime[w], n == 4 ? 16u : 0u) << n;
             EXPECT_FLOAT_EQ(slot.leftY, held[n] != 0 ? -1.0f : 0.0f) << n;
             EXPECT_EQ(slot.pressed[1] + slot.current[kWheelUpButton], n == 0 ? 2u : 1u);
-            EXPECT_FLOAT_EQ(slot.cursorDeltaX, n == 0 ? 200.0f : 0.0f) << "moved from (0, 0)";
+            EXPECT_FLOAT_EQ(slot.cursorDeltaX, n == 1 ? 195.0f : 0.0f) << "moved from (5, -5)";
             EXPECT_EQ(slot.xinputAllowed, s < 4 ? 1u : 0u);
         }
     }
@@ -97,6 +98,7 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     in.Update();
     EXPECT_EQ(in.GetJoystickCount(), 2);
     EXPECT_EQ(in.GetJoystickInfo(0), nullptr);
+    EXPECT_EQ(in.GetJoystickState(0), nullptr);
     EXPECT_STREQ(in.GetJoystickInfo(1)->tszInstanceName, "Pad");
     EXPECT_EQ(in.GetJoyButton(1, 0) + in.GetJoyButton(1, 32) + in.GetJoyButton(16, 0), 1);
     const InputSlot& slot0 = in.GetSlot(0);

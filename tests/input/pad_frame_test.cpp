@@ -1,5 +1,7 @@
-// Controller frames from DirectInput and XInput, and the names of keys and
+// What a slot makes of the devices: the controller frames of DirectInput and
+// XInput, the sticks under the movement keys, and the names of keys and
 // buttons.
+#include "input/input_slot.h"
 #include "input/name_tables.h"
 #include "input/pad_frame.h"
 
@@ -108,6 +110,28 @@ TEST(XInputFrame, ThumbsRestUpTo6000AndPointFrom16383TriggersPressFrom128)
         EXPECT_EQ(SetEntries(frame), entries) << t[0] << ", " << t[2];
         EXPECT_EQ((Thumbs{pad.sThumbLX, pad.sThumbLY, pad.sThumbRX, pad.sThumbRY}), after)
             << t[0] << ", " << t[2];
+    }
+}
+
+// The movement keys force a stick to full deflection; without them it keeps
+// the device's value.
+TEST(SlotSticks, MovementKeysForceFullDeflection)
+{
+    using Axis = float InputSlot::*;
+    const std::tuple<int, Axis, float> rows[] = {
+        {4, &InputSlot::leftY, -1.0f},   {5, &InputSlot::leftY, 1.0f},
+        {6, &InputSlot::leftX, -1.0f},   {7, &InputSlot::leftX, 1.0f},
+        {9, &InputSlot::rightY, -1.0f},  {10, &InputSlot::rightY, 1.0f},
+        {11, &InputSlot::rightX, -1.0f}, {12, &InputSlot::rightX, 1.0f},
+        {13, &InputSlot::rightX, 0.5f}};
+    for (const auto& [action, axis, value] : rows)
+    {
+        InputSlot slot = {};
+        slot.analogValid = 1;
+        slot.leftX = slot.leftY = slot.rightX = slot.rightY = 0.5f;
+        slot.current[kFirstVirtualButton + action] = 1;
+        ApplyDigitalOverrides(slot);
+        EXPECT_EQ(slot.*axis, value) << action;
     }
 }
 
