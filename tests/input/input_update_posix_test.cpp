@@ -127,6 +127,9 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     EXPECT_EQ(Devices().vibration[0].wLeftMotorSpeed, 1000);
     EXPECT_EQ(slot0.vibrationLeft, 680);
     EXPECT_EQ(slot0.vibrationRight, 0);
+    in.GetSlot(0).vibrationLeft = 0;
+    in.Update();
+    EXPECT_EQ(Devices().vibration[0].wLeftMotorSpeed, 0) << "both at 0 stop the motors";
 }
 
 // The pages read the live devices through the same decisions.
