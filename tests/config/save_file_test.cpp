@@ -10,11 +10,7 @@
 #include <string>
 
 using config::CSaveConfig;
-using testing_support::ReadBytes;
-using testing_support::ScopedEnvironment;
-using testing_support::TempFolder;
-using testing_support::TempSaveFolder;
-using testing_support::WriteBytes;
+using namespace testing_support;
 using Bytes = std::vector<std::uint8_t>;
 
 namespace fs = std::filesystem;
@@ -114,7 +110,7 @@ TEST(SaveFile, ASettingsPathOf259BytesIsUsed)
     TempFolder root;
     const std::string sep(1, base::PathSeparator());
     // "Tolvenik", "VEK", "GameConfig.dat" and the separators before them.
-    const std::string kept = testing_support::PathOfLength(root, 259 - 27 - 1, "");
+    const std::string kept = PathOfLength(root, 259 - 27 - 1, "");
     ASSERT_FALSE(kept.empty());
     fs::create_directory(kept);
     ScopedEnvironment temp("TEMP", (kept + sep + "Temp").c_str());

@@ -58,9 +58,14 @@ TEST(KeyCapture, AKeyGoesToTheFocusedActionAndItsOwnerGetsTheFormerKey)
         std::uint8_t down[kKeyCodeCount] = {};
         for (int key : keysDown)
             down[key] = 1;
-        EXPECT_EQ(Outcome(DecideKeyCapture(keys.keyboardKeys, focused, down)),
-                  std::make_pair(changes, next))
-            << "focused " << int(focused);
+        const Capture capture = DecideKeyCapture(keys.keyboardKeys, focused, down);
+        EXPECT_EQ(Outcome(capture), std::make_pair(changes, next)) << "focused " << int(focused);
+        config::ConfigKeys stored = keys;
+        std::int8_t focus = focused;
+        ApplyKeyCapture(capture, stored, focus);
+        for (const auto& [action, code] : changes)
+            EXPECT_EQ(stored.keyboardKeys[action], code);
+        EXPECT_EQ(focus, next < 0 ? focused : next);
     }
 }
 
@@ -98,35 +103,21 @@ TEST(PadCapture, AButtonIsExchangedWithItsActionOrStoredAloneAndSticksAreNever)
         std::uint8_t raw[kCaptureJoyButtons] = {};
         for (int button : held)
             raw[button] = 1;
-        EXPECT_EQ(Outcome(DecidePadCapture(keys.padConfigs[0].buttons, focused, slot, raw)),
-                  std::make_pair(changes, next))
+        const Capture capture = DecidePadCapture(keys.padConfigs[0].buttons, focused, slot, raw);
+        EXPECT_EQ(Outcome(capture), std::make_pair(changes, next))
             << "focused " << int(focused) << " pressed " << pressed;
-    }
-}
 
-// A stored capture keeps slot 0's maps on the player's codes, and counts the
-// captured button as already down, so that held on it presses no further
-// action.
-TEST(PadCapture, AStoredCaptureUpdatesTheSlotAndTheFocus)
-{
-    config::ConfigKeys keys = DefaultKeys();
-    InputSlot slot;
-    ResetSlot(slot, 0, true);
-    std::int8_t focused = 14;
-    const Capture exchange = {true, 14, 15, 2, {{16, 14}, {14, 16}}};
-    ApplyPadCapture(exchange, keys.padConfigs[0], slot, focused);
-    ApplyKeyCapture(exchange, keys, focused);
-    for (const auto& [action, code] : exchange.changes)
-    {
-        EXPECT_EQ(keys.padConfigs[0].buttons[action], code);
-        EXPECT_EQ(slot.joyMap[action], code);
-        EXPECT_EQ(slot.xinputMap[action], code);
-        EXPECT_EQ(keys.keyboardKeys[action], code);
+        // Stored, slot 0's maps follow the codes, and the captured button
+        // counts as already down: held on, it presses no further action.
+        config::PadConfig player = keys.padConfigs[0];
+        std::int8_t focus = focused;
+        ApplyPadCapture(capture, player, slot, focus);
+        for (const auto& [action, code] : changes)
+            EXPECT_EQ(std::make_pair(slot.joyMap[action], slot.xinputMap[action]),
+                      std::make_pair(code, player.buttons[action]));
+        EXPECT_EQ(focus, next < 0 ? focused : next);
+        EXPECT_EQ(slot.current[kFirstVirtualButton + focused], changes.empty() ? 0u : 1u);
     }
-    EXPECT_EQ(slot.current[kFirstVirtualButton + 14], 1u);
-    EXPECT_EQ(focused, 15);
-    ApplyPadCapture(Capture{}, keys.padConfigs[0], slot, focused);
-    EXPECT_EQ(focused, 15) << "nothing captured, nothing changes";
 }
 
 TEST(FocusOrder, ShownBoxesAreVisitedInReadingOrderAndWrapAround)
