@@ -176,8 +176,8 @@ TEST_F(Commands, ShowPrintsEverySettingByNameWithItsMeaning)
     for (const char8_t* line :
          {u8"version = 318771200 (0x13001000)\n", u8"graphics.screenSize = 8 (1920×1080)\n",
           u8"graphics.hdrLevel = 5 (no such choice)\n", u8"game.bgmVolume = -10000 (silent)\n",
-          u8"game.seVolume = -1250 (-12.50 dB)\n", u8"network.keyResponse = 1 (2)\n",
-          u8"network.connectList[0] = \"10.10.10.0\"\n",
+          u8"game.seVolume = -1250 (-12.50 dB)\n", u8"game.captureEnabled = 0 (off)\n",
+          u8"network.keyResponse = 1 (2)\n", u8"network.connectList[0] = \"10.10.10.0\"\n",
           u8"network.allowList[0] = \"010.010.010.*\"\n", u8"network.denyList = (none)\n",
           u8"replay.replayLock[29] = 0 (リプレイ30: unlocked)\n",
           u8"keys.keyboardKeys[4] = 456 (移動上: UP)\n",

@@ -130,6 +130,9 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     in.GetSlot(0).vibrationLeft = 0;
     in.Update();
     EXPECT_EQ(Devices().vibration[0].wLeftMotorSpeed, 0) << "both at 0 stop the motors";
+    Devices().xinputConnected[0] = false;
+    in.Update();
+    EXPECT_EQ(slot0.analogValid, 0u) << "unplugged, with no controller of its own";
 }
 
 // The pages read the live devices through the same decisions.
