@@ -4,43 +4,25 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 
-using testing_support::ReadBytes;
-using testing_support::TempFolder;
-using testing_support::WriteBytes;
+namespace fs = std::filesystem;
 
-TEST(AtomicFile, ReplacesAnExistingFileAndLeavesNoTemporary)
+// The temporary file's name is never longer than the file's, so a path short
+// enough for the system has a temporary one that is too.
+TEST(AtomicFile, ReplacesTheFileOrLeavesWhatStandsThereAndNoTemporary)
 {
-    TempFolder folder;
-    const std::string path = folder.File("data.bin");
-    WriteBytes(path, {9, 9, 9, 9, 9});
+    EXPECT_EQ(base::TemporaryPathFor("GameConfig.dat"), "GameConfig.new");
+    EXPECT_EQ(base::TemporaryPathFor("a.b/GameConfig"), "a.b/GameConfig.new");
+    EXPECT_EQ(base::TemporaryPathFor("notes.new"), "notes.tmp");
+
+    testing_support::TempFolder folder;
+    const std::string file = folder.File("data.bin"), inTheWay = folder.File("folder.bin");
+    testing_support::WriteBytes(file, {9, 9, 9, 9, 9});
+    fs::create_directories(inTheWay);
     const std::uint8_t data[] = {1, 2, 3};
-    ASSERT_TRUE(base::WriteFileAtomically(path.c_str(), data, sizeof data));
-    EXPECT_EQ(ReadBytes(path), (std::vector<std::uint8_t>{1, 2, 3}));
-    EXPECT_FALSE(std::filesystem::exists(base::TemporaryPathFor(path)));
-}
-
-TEST(AtomicFile, TheTemporaryNameIsNeverLongerThanTheFile)
-{
-    const struct
-    {
-        const char* path;
-        const char* temporary;
-    } cases[] = {
-        {"GameConfig.dat", "GameConfig.new"},
-        {"a.b/GameConfig", "a.b/GameConfig.new"},
-        {"notes.new", "notes.tmp"},
-    };
-    for (const auto& c : cases)
-        EXPECT_EQ(base::TemporaryPathFor(c.path), c.temporary) << c.path;
-}
-
-TEST(AtomicFile, AFolderInTheWayFailsWithoutTouchingIt)
-{
-    TempFolder folder;
-    const std::string path = folder.File("data.bin");
-    std::filesystem::create_directories(path);
-    const std::uint8_t data[] = {1};
-    EXPECT_FALSE(base::WriteFileAtomically(path.c_str(), data, sizeof data));
-    EXPECT_TRUE(std::filesystem::is_directory(path));
-    EXPECT_FALSE(std::filesystem::exists(base::TemporaryPathFor(path)));
+    ASSERT_TRUE(base::WriteFileAtomically(file.c_str(), data, sizeof data));
+    EXPECT_EQ(testing_support::ReadBytes(file), std::vector<std::uint8_t>(data, data + 3));
+    EXPECT_FALSE(base::WriteFileAtomically(inTheWay.c_str(), data, sizeof data));
+    EXPECT_TRUE(fs::is_directory(inTheWay));
+    EXPECT_FALSE(fs::exists(base::TemporaryPathFor(file)));
+    EXPECT_FALSE(fs::exists(base::TemporaryPathFor(inTheWay)));
 }

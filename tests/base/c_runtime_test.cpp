@@ -8,40 +8,27 @@
 
 TEST(CRuntime, TextModeJoinsCrLfKeepsLoneCrAndStopsAtCtrlZ)
 {
-    const struct
+    const std::pair<std::string, std::string> cases[] = {
+        {"a\r\nb\r\n", "a\nb\n"},                  // CR LF pairs
+        {"b\r\r\nc", "b\r\nc"},                    // a CR before a CR LF
+        {"c\rd\r", "c\rd\r"},                      // a lone CR, also at the end
+        {std::string("x\r\x1A\nrest", 7), "x\r"}}; // Ctrl-Z ends the text
+    for (auto [bytes, text] : cases)
     {
-        const char* what;
-        std::string bytes;
-        std::string text;
-    } cases[] = {
-        {"CR LF pairs", "a\r\nb\r\n", "a\nb\n"},
-        {"a CR before a CR LF", "b\r\r\nc", "b\r\nc"},
-        {"a lone CR, also at the end", "c\rd\r", "c\rd\r"},
-        {"Ctrl-Z ends the text", std::string("x\r\x1A\nrest", 7), "x\r"},
-    };
-    for (const auto& c : cases)
-    {
-        std::string bytes = c.bytes;
         bytes.resize(base::TranslateTextMode(bytes.data(), bytes.size()));
-        EXPECT_EQ(bytes, c.text) << c.what;
+        EXPECT_EQ(bytes, text);
     }
 }
 
 TEST(CRuntime, NumbersReadAsTheWindowsAtofReadsThem)
 {
-    const struct
-    {
-        const char* text;
-        double value;
-    } cases[] = {
+    const std::pair<const char*, double> cases[] = {
         {"0x1E", 0},    {"inf", 0},     {"nan", 0}, {"1d2", 100},      {"1E+2", 100},
         {"2e-2", 0.02}, {"1e", 1},      {"1e+", 1}, {" \f\v+.5", 0.5}, {"-3", -3},
         {"5.", 5},      {".", 0},       {"1,5", 1}, {"0030", 30},      {"1.5e3x", 1500},
-        {"--1", 0},     {"1.2.3", 1.2}, {"1q2", 1}, {"1e-400", 0},     {"0.0001e5", 10},
-    };
-    for (const auto& c : cases)
-        EXPECT_DOUBLE_EQ(base::ReadDecimal(c.text), c.value) << c.text;
-
+        {"--1", 0},     {"1.2.3", 1.2}, {"1q2", 1}, {"1e-400", 0},     {"0.0001e5", 10}};
+    for (const auto& [text, value] : cases)
+        EXPECT_DOUBLE_EQ(base::ReadDecimal(text), value) << text;
     EXPECT_EQ(base::ReadDecimal("1e400"), HUGE_VAL);
     EXPECT_EQ(base::ReadDecimal(std::string(400, '9').c_str()), HUGE_VAL);
     EXPECT_EQ(base::ReadDecimal("-1e400"), -HUGE_VAL);

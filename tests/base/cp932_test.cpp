@@ -2,20 +2,14 @@
 
 #include <gtest/gtest.h>
 
+// ソ is 0x83 0x5C; a lead byte at the end stands alone.
 TEST(Cp932, TheLastBackslashIsNeverATrailByte)
 {
-    const struct
+    const std::pair<const char*, int> cases[] = {{"C:\\a\\b", 4}, {"C:\\ソ", 2},  {"C:\\ソ\\x", 5},
+                                                 {"ソ", -1},      {"a\\\x83", 1}, {"", -1}};
+    for (const auto& [text, position] : cases)
     {
-        const char* text;
-        int position; // -1: none
-    } cases[] = {
-        {"C:\\a\\b", 4},  {"C:\\ソ", 2},                 // 0x83 0x5C
-        {"C:\\ソ\\x", 5}, {"ソ", -1},    {"a\\\x83", 1}, // a lead byte at the end stands alone
-        {"", -1},
-    };
-    for (const auto& c : cases)
-    {
-        const char* last = base::FindLastCharacter(c.text, '\\');
-        EXPECT_EQ(last == nullptr ? -1 : int(last - c.text), c.position) << c.text;
+        const char* last = base::FindLastCharacter(text, '\\');
+        EXPECT_EQ(last == nullptr ? -1 : int(last - text), position) << text;
     }
 }

@@ -1,31 +1,24 @@
-// What the user music page decides without a window.
+// What the user music page decides without a window: the row and the control
+// an identifier names.
 #include "dialog/user_music_values.h"
 
 #include <gtest/gtest.h>
+#include <tuple>
 
 using dialog::MusicColumn;
-using dialog::MusicControlOf;
 
 TEST(MusicControl, EachIdentifierNamesItsRowAndControl)
 {
-    const struct
-    {
-        int id;
-        int row;
-        MusicColumn column;
-    } cases[] = {
+    const std::tuple<int, int, MusicColumn> cases[] = {
         {7001, 0, MusicColumn::MusicPath}, {7002, 0, MusicColumn::TensionPath},
         {7003, 0, MusicColumn::Browse},    {7004, 0, MusicColumn::Check},
-        {7005, 1, MusicColumn::MusicPath}, {7038, 9, MusicColumn::TensionPath},
-        {7040, 9, MusicColumn::Check},
-    };
-    for (const auto& c : cases)
+        {7005, 1, MusicColumn::MusicPath}, {7040, 9, MusicColumn::Check}};
+    for (const auto& [id, row, column] : cases)
     {
-        const auto control = MusicControlOf(c.id);
-        ASSERT_TRUE(control.has_value()) << c.id;
-        EXPECT_EQ(control->row, c.row) << c.id;
-        EXPECT_EQ(control->column, c.column) << c.id;
+        const auto control = dialog::MusicControlOf(id);
+        ASSERT_TRUE(control.has_value()) << id;
+        EXPECT_EQ(std::make_pair(control->row, control->column), std::make_pair(row, column));
     }
-    for (const int id : {0, 7000, 7041, 1})
-        EXPECT_FALSE(MusicControlOf(id).has_value()) << id;
+    for (const int id : {7000, 7041})
+        EXPECT_FALSE(dialog::MusicControlOf(id).has_value()) << id;
 }

@@ -1,289 +1,137 @@
 // Captures on the key assignment pages: which codes change and where the
 // focus goes.
+#include "config/save_config.h"
 #include "input/key_assignment.h"
-#include "input/name_tables.h"
 
-#include <algorithm>
 #include <gtest/gtest.h>
+#include <tuple>
 #include <vector>
 
 using namespace input;
+using Changes = std::vector<std::pair<int, std::uint32_t>>;
 
 namespace
 {
 
-constexpr std::uint8_t kZ = 0x2C;
-constexpr std::uint8_t kX = 0x2D;
-
-// The keyboard keys of a fresh settings file.
-const std::uint32_t kDefaultKeys[kActionCount] = {
-    0x50, 0x48, 0x4B, 0x4D, 0xC8, 0xD0, 0xCB, 0xCD, 0x11, 0x4F, 0x51, 0x47,
-    0x49, 0x4C, 0x2C, 0x2F, 0x2D, 0x2E, 0x10, 0x1F, 0x1E, 0x20, 0x1C, 0x39,
-};
+constexpr int kZ = 0x2C;
+constexpr int kX = 0x2D;
 
 config::ConfigKeys DefaultKeys()
 {
-    config::ConfigKeys keys = {};
-    std::copy(std::begin(kDefaultKeys), std::end(kDefaultKeys), keys.keyboardKeys);
-    for (config::PadConfig& player : keys.padConfigs)
-    {
-        for (int action = 0; action < kActionCount; ++action)
-            player.buttons[action] = static_cast<std::uint32_t>(action);
-    }
-    return keys;
+    config::CSaveConfig record;
+    record.ResetKeys();
+    return *record.Keys();
 }
 
-struct KeyPress
+// The changes in the order the page makes them, and the next focus (-1 when
+// nothing was captured).
+std::pair<Changes, int> Outcome(const Capture& capture)
 {
-    std::uint8_t wentDown[kKeyCodeCount] = {};
-    KeyPress(std::initializer_list<int> keys)
-    {
-        for (int key : keys)
-            wentDown[key] = 1;
-    }
-};
-
-std::vector<std::pair<int, std::uint32_t>> Changes(const Capture& capture)
-{
-    std::vector<std::pair<int, std::uint32_t>> changes;
+    Changes changes;
     for (int i = 0; i < capture.changeCount; ++i)
         changes.emplace_back(capture.changes[i].action, capture.changes[i].code);
-    return changes;
+    return {changes, capture.happened ? capture.nextFocus : -1};
 }
 
-using ChangeList = std::vector<std::pair<int, std::uint32_t>>;
+} // namespace
 
-TEST(KeyCapture, AKeyOfAnotherActionIsExchangedAndTheFocusMovesOn)
+TEST(KeyCapture, AKeyGoesToTheFocusedActionAndItsOwnerGetsTheFormerKey)
 {
-    config::ConfigKeys keys = DefaultKeys();
-    std::int8_t focused = 14;
-    const Capture capture = DecideKeyCapture(keys.keyboardKeys, focused, KeyPress{kX}.wentDown);
-    EXPECT_EQ(Changes(capture), (ChangeList{{16, kZ}, {14, kX}}));
-
-    ApplyKeyCapture(capture, keys, focused);
-    EXPECT_STREQ(KeyName(keys.keyboardKeys[14]), "X");
-    EXPECT_STREQ(KeyName(keys.keyboardKeys[16]), "Z");
-    EXPECT_EQ(focused, 15);
-}
-
-TEST(KeyCapture, TheActionsOwnKeyOnlyMovesTheFocus)
-{
-    config::ConfigKeys keys = DefaultKeys();
-    std::int8_t focused = 14;
-    const Capture capture = DecideKeyCapture(keys.keyboardKeys, focused, KeyPress{kZ}.wentDown);
-    EXPECT_TRUE(capture.happened);
-    EXPECT_EQ(capture.changeCount, 0);
-    ApplyKeyCapture(capture, keys, focused);
-    EXPECT_EQ(focused, 15);
-    EXPECT_EQ(keys.keyboardKeys[14], kZ);
-}
-
-TEST(KeyCapture, AFreeKeyReplacesTheFocusedActionsKeyAlone)
-{
-    const Capture capture = DecideKeyCapture(kDefaultKeys, 23, KeyPress{0x30}.wentDown);
-    EXPECT_EQ(Changes(capture), (ChangeList{{23, 0x30}}));
-    EXPECT_EQ(capture.nextFocus, 22);
-}
-
-TEST(KeyCapture, EscapeAndFunctionKeysAreIgnoredEvenWithAnotherKey)
-{
-    for (int key : {0x01, 0x3B, 0x3C, 0x3D, 0x3E, 0x3F, 0x40, 0x41, 0x42, 0x43, 0x44, 0x57, 0x58})
+    const config::ConfigKeys keys = DefaultKeys();
+    // The focused action, the keys that went down, what changes, the next focus.
+    const std::tuple<std::int8_t, std::vector<int>, Changes, int> rows[] = {
+        {14, {kX}, {{16, kZ}, {14, kX}}, 15},     // X was action 16's
+        {14, {kZ}, {}, 15},                       // its own key only moves the focus
+        {23, {0x30}, {{23, 0x30}}, 22},           // a key no action has
+        {8, {kX, kZ}, {{14, 0x11}, {8, kZ}}, 23}, // the lower code of two
+        {0, {kX}, {{16, 0x50}, {0, kX}}, 1},      // before any focus: hidden action 0
+        {14, {0x01, 0x60}, {}, -1},               // ESCAPE, also with another key
+        {14, {0x3B}, {}, -1},                     // F1 to F12
+        {14, {0x44}, {}, -1},
+        {14, {0x57}, {}, -1},
+        {14, {0x58}, {}, -1},
+        {14, {}, {}, -1},
+        {24, {kX}, {}, -1},
+        {-1, {kX}, {}, -1}};
+    for (const auto& [focused, keysDown, changes, next] : rows)
     {
-        EXPECT_FALSE(DecideKeyCapture(kDefaultKeys, 14, KeyPress{key}.wentDown).happened) << key;
-        EXPECT_FALSE(DecideKeyCapture(kDefaultKeys, 14, KeyPress{key, 0x60}.wentDown).happened)
-            << key;
+        std::uint8_t down[kKeyCodeCount] = {};
+        for (int key : keysDown)
+            down[key] = 1;
+        const Capture capture = DecideKeyCapture(keys.keyboardKeys, focused, down);
+        EXPECT_EQ(Outcome(capture), std::make_pair(changes, next)) << "focused " << int(focused);
+        config::ConfigKeys stored = keys;
+        std::int8_t focus = focused;
+        ApplyKeyCapture(capture, stored, focus);
+        for (const auto& [action, code] : changes)
+            EXPECT_EQ(stored.keyboardKeys[action], code);
+        EXPECT_EQ(focus, next < 0 ? focused : next);
     }
 }
 
-TEST(KeyCapture, OfTwoKeysTheLowerCodeIsTaken)
+// Slot 0 holds the player's codes in its maps, so the slot button of the
+// action that has a button goes down with it; other buttons are read raw.
+TEST(PadCapture, AButtonIsExchangedWithItsActionOrStoredAloneAndSticksAreNever)
 {
-    const Capture capture = DecideKeyCapture(kDefaultKeys, 8, KeyPress{kX, kZ}.wentDown);
-    EXPECT_EQ(Changes(capture), (ChangeList{{14, 0x11}, {8, kZ}}));
-}
+    const config::ConfigKeys keys = DefaultKeys();
+    // The focused action, the action whose slot button went down (-1 none),
+    // the raw buttons held, what changes, the next focus.
+    const std::tuple<std::int8_t, int, std::vector<int>, Changes, int> rows[] = {
+        {14, 0, {}, {{0, 14}, {14, 0}}, 15},      // the d-pad, hidden action 0's
+        {14, 14, {}, {}, 15},                     // its own button only moves the focus
+        {14, 16, {12}, {{16, 14}, {14, 16}}, 15}, // a slot button before a raw one
+        {2, 2, {}, {}, 3},                        // the focus goes on by the table...
+        {1, 14, {}, {{14, 1}, {1, 14}}, 14},      // ...and after an exchange it skips
+        {2, 14, {}, {{14, 2}, {2, 14}}, 8},       // to the stick's push
+        {9, 14, {}, {{14, 9}, {9, 14}}, 13},
+        {12, 14, {}, {{14, 12}, {12, 14}}, 13},
+        {9, -1, {12}, {{9, 24}}, 9}, // raw button 12 is BUTTON13
+        {15, -1, {0}, {}, -1},       // held, but action 14 has it
+        {15, -1, {1, 12}, {}, -1},   // the lowest held button decides
+        {14, 4, {12}, {}, -1},       // stick directions
+        {14, 12, {12}, {}, -1},
+        {14, -1, {}, {}, -1},
+        {24, 16, {}, {}, -1},
+        {-1, 16, {}, {}, -1}};
+    for (const auto& [focused, pressed, held, changes, next] : rows)
+    {
+        InputSlot slot;
+        ResetSlot(slot, 0, true);
+        BindPlayerToSlot(keys.padConfigs[0], slot);
+        if (pressed >= 0)
+            slot.pressed[kFirstVirtualButton + pressed] = 1;
+        std::uint8_t raw[kCaptureJoyButtons] = {};
+        for (int button : held)
+            raw[button] = 1;
+        const Capture capture = DecidePadCapture(keys.padConfigs[0].buttons, focused, slot, raw);
+        EXPECT_EQ(Outcome(capture), std::make_pair(changes, next))
+            << "focused " << int(focused) << " pressed " << pressed;
 
-TEST(KeyCapture, BeforeAnyFocusTheKeyGoesToHiddenActionZero)
-{
-    config::ConfigKeys keys = DefaultKeys();
-    std::int8_t focused = 0;
-    ApplyKeyCapture(DecideKeyCapture(keys.keyboardKeys, focused, KeyPress{kX}.wentDown), keys,
-                    focused);
-    EXPECT_EQ(keys.keyboardKeys[0], kX);
-    EXPECT_STREQ(KeyName(keys.keyboardKeys[16]), "NUMPAD2");
-    EXPECT_EQ(focused, 1);
-}
-
-TEST(KeyCapture, NothingHappensWithoutAKeyOrAnAction)
-{
-    EXPECT_FALSE(DecideKeyCapture(kDefaultKeys, 14, KeyPress{}.wentDown).happened);
-    for (std::int8_t focused : {-1, 24, 127})
-        EXPECT_FALSE(DecideKeyCapture(kDefaultKeys, focused, KeyPress{kX}.wentDown).happened);
-
-    config::ConfigKeys keys = DefaultKeys();
-    std::int8_t focused = 14;
-    ApplyKeyCapture(DecideKeyCapture(keys.keyboardKeys, focused, KeyPress{}.wentDown), keys,
-                    focused);
-    EXPECT_EQ(focused, 14);
-}
-
-std::vector<int> ReadingOrder(const std::int8_t (&order)[kActionCount], int first)
-{
-    std::vector<int> visited = {first};
-    for (int action = order[first]; action != first && visited.size() <= kActionCount;
-         action = order[action])
-        visited.push_back(action);
-    return visited;
+        // Stored, slot 0's maps follow the codes, and the captured button
+        // counts as already down: held on, it presses no further action.
+        config::PadConfig player = keys.padConfigs[0];
+        std::int8_t focus = focused;
+        ApplyPadCapture(capture, player, slot, focus);
+        for (const auto& [action, code] : changes)
+            EXPECT_EQ(std::make_pair(slot.joyMap[action], slot.xinputMap[action]),
+                      std::make_pair(code, player.buttons[action]));
+        EXPECT_EQ(focus, next < 0 ? focused : next);
+        EXPECT_EQ(slot.current[kFirstVirtualButton + focused], changes.empty() ? 0u : 1u);
+    }
 }
 
 TEST(FocusOrder, ShownBoxesAreVisitedInReadingOrderAndWrapAround)
 {
-    EXPECT_EQ(ReadingOrder(kKeyboardFocusOrder, 4),
+    const auto walk = [](const std::int8_t(&order)[kActionCount], int first)
+    {
+        std::vector<int> visited = {first};
+        for (int action = order[first]; action != first && visited.size() <= kActionCount;
+             action = order[action])
+            visited.push_back(action);
+        return visited;
+    };
+    EXPECT_EQ(walk(kKeyboardFocusOrder, 4),
               (std::vector<int>{4, 5, 6, 7, 14, 15, 16, 17, 19, 21, 18, 20, 8, 23, 22}));
-    EXPECT_EQ(ReadingOrder(kPadFocusOrder, 14),
+    EXPECT_EQ(walk(kPadFocusOrder, 14),
               (std::vector<int>{14, 15, 16, 17, 19, 21, 18, 20, 8, 23, 22}));
 }
-
-// Slot 0 as the controller page leaves it, with `owner`'s slot button
-// pressed at this update when given.
-struct PadPage
-{
-    config::ConfigKeys keys = DefaultKeys();
-    InputSlot slot;
-    std::uint8_t rawButtons[kCaptureJoyButtons] = {};
-
-    PadPage()
-    {
-        ResetSlot(slot, 0, true);
-        BindPlayerToSlot(keys.padConfigs[0], slot);
-    }
-    std::uint32_t (&codes())[kActionCount] { return keys.padConfigs[0].buttons; }
-    Capture Decide(std::int8_t focused) const
-    {
-        return DecidePadCapture(keys.padConfigs[0].buttons, focused, slot, rawButtons);
-    }
-    void Press(int action) { slot.pressed[kFirstVirtualButton + action] = 1; }
-};
-
-TEST(PadCapture, StickDirectionsAreNeverCaptured)
-{
-    for (int direction : {4, 5, 6, 7, 9, 10, 11, 12})
-    {
-        PadPage page;
-        page.Press(direction);
-        page.rawButtons[12] = 1;
-        EXPECT_FALSE(page.Decide(14).happened) << direction;
-    }
-}
-
-TEST(PadCapture, TheDpadIsExchangedWithTheHiddenActionThatHadIt)
-{
-    PadPage page;
-    std::int8_t focused = 14;
-    page.Press(0);
-    const Capture capture = page.Decide(focused);
-    ApplyPadCapture(capture, page.keys.padConfigs[0], page.slot, focused);
-
-    EXPECT_STREQ(PadButtonName(static_cast<std::uint8_t>(page.codes()[14])), "DP_UP");
-    EXPECT_STREQ(PadButtonName(static_cast<std::uint8_t>(page.codes()[0])), "BUTTON1");
-    EXPECT_EQ(page.slot.joyMap[14], 0u);
-    EXPECT_EQ(page.slot.xinputMap[14], 0u);
-    EXPECT_EQ(page.slot.joyMap[0], 14u);
-    EXPECT_EQ(page.slot.xinputMap[0], 14u);
-    EXPECT_EQ(page.slot.current[kFirstVirtualButton + 14], 1u);
-    EXPECT_EQ(focused, 15);
-}
-
-TEST(PadCapture, TheFocusedActionsOwnButtonOnlyMovesTheFocus)
-{
-    PadPage page;
-    page.Press(14);
-    std::int8_t focused = 14;
-    const Capture capture = page.Decide(focused);
-    ApplyPadCapture(capture, page.keys.padConfigs[0], page.slot, focused);
-    EXPECT_EQ(capture.changeCount, 0);
-    EXPECT_EQ(focused, 15);
-    EXPECT_EQ(page.slot.current[kFirstVirtualButton + 14], 0u);
-}
-
-TEST(PadCapture, AfterAnExchangeTheFocusSkipsToTheStickPush)
-{
-    struct Case
-    {
-        std::int8_t focused;
-        int pressed;
-        std::int8_t next;
-    };
-    const Case cases[] = {
-        {14, 16, 15},
-        {1, 14, 14},
-        {2, 14, 8},
-        {3, 14, 8},
-        {6, 14, 8},
-        {9, 14, 13},
-        {12, 14, 13},
-        {22, 14, 14},
-        {0, 14, 1},
-        // Without an exchange the table holds as it is.
-        {2, 2, 3},
-    };
-    for (const Case& c : cases)
-    {
-        PadPage page;
-        page.Press(c.pressed);
-        EXPECT_EQ(page.Decide(c.focused).nextFocus, c.next)
-            << "focused " << int(c.focused) << " pressed " << c.pressed;
-    }
-
-    PadPage raw;
-    raw.rawButtons[12] = 1;
-    EXPECT_EQ(raw.Decide(9).nextFocus, 9);
-}
-
-TEST(PadCapture, AnUnassignedRawButtonGivesItsFrameCodeToTheFocusedActionAlone)
-{
-    const std::pair<int, std::uint32_t> cases[] = {{4, 19}, {6, 18}, {12, 24}, {31, 43}};
-    for (const auto& [button, code] : cases)
-    {
-        PadPage page;
-        // Free the codes of the default assignment that the button feeds.
-        page.codes()[18] = 40;
-        page.codes()[19] = 41;
-        page.rawButtons[button] = 1;
-        std::int8_t focused = 15;
-        const Capture capture = page.Decide(focused);
-        EXPECT_EQ(Changes(capture), (ChangeList{{15, code}})) << "button " << button;
-        ApplyPadCapture(capture, page.keys.padConfigs[0], page.slot, focused);
-        EXPECT_EQ(page.slot.joyMap[15], code);
-        EXPECT_EQ(page.slot.current[kFirstVirtualButton + 15], 1u);
-        EXPECT_EQ(focused, 16);
-    }
-}
-
-TEST(PadCapture, AHeldButtonThatAnActionHasStoresNothing)
-{
-    PadPage page;
-    page.rawButtons[0] = 1; // BUTTON1, action 14's
-    EXPECT_FALSE(page.Decide(15).happened);
-
-    page.rawButtons[1] = 1; // the lowest held button decides
-    page.rawButtons[12] = 1;
-    EXPECT_FALSE(page.Decide(15).happened);
-}
-
-TEST(PadCapture, APressedSlotButtonComesBeforeRawButtons)
-{
-    PadPage page;
-    page.rawButtons[12] = 1;
-    page.Press(16);
-    EXPECT_EQ(Changes(page.Decide(14)), (ChangeList{{16, 14}, {14, 16}}));
-}
-
-TEST(PadCapture, NothingHappensWithoutAButtonOrAnAction)
-{
-    PadPage page;
-    EXPECT_FALSE(page.Decide(14).happened);
-    page.Press(16);
-    EXPECT_FALSE(page.Decide(-1).happened);
-    EXPECT_FALSE(page.Decide(24).happened);
-}
-
-} // namespace

@@ -1,18 +1,25 @@
-// Controller frames from DirectInput and XInput: d-pad, thresholds, dead
-// zones and the right stick's options.
+// What a slot makes of the devices: the controller frames of DirectInput and
+// XInput, the sticks under the movement keys, and the names of keys and
+// buttons.
+#include "input/input_slot.h"
+#include "input/name_tables.h"
 #include "input/pad_frame.h"
 
+#include <array>
+#include <cstring>
 #include <gtest/gtest.h>
+#include <string>
+#include <tuple>
 #include <vector>
 
 using namespace input;
+using Entries = std::vector<int>;
 
 namespace
 {
-
-std::vector<int> SetEntries(const PadFrame& frame)
+Entries SetEntries(const PadFrame& frame)
 {
-    std::vector<int> entries;
+    Entries entries;
     for (int i = 0; i < kPadFrameSize; ++i)
     {
         if (frame.flags[i] != 0)
@@ -20,239 +27,124 @@ std::vector<int> SetEntries(const PadFrame& frame)
     }
     return entries;
 }
-
-DIJOYSTATE2 CentredJoystick()
-{
-    DIJOYSTATE2 state = {};
-    state.rgdwPOV[0] = 0xFFFFFFFF;
-    return state;
-}
-
-std::vector<int> FrameOf(DIJOYSTATE2& state, RightStickOptions options = {})
-{
-    PadFrame frame = {};
-    FillFrameFromJoystick(state, options, frame);
-    return SetEntries(frame);
-}
-
-std::vector<int> FrameOf(XINPUT_GAMEPAD& pad, RightStickOptions options = {})
-{
-    PadFrame frame = {};
-    FillFrameFromXInput(pad, options, frame);
-    return SetEntries(frame);
-}
-
-using Entries = std::vector<int>;
-
-TEST(JoystickFrame, PovDirectionsIncludeTheirDiagonalsAndCentredSetsNothing)
-{
-    struct Case
-    {
-        std::uint32_t pov;
-        Entries expected;
-    };
-    const Case cases[] = {
-        {0xFFFF, {}},
-        {0xFFFFFFFF, {}},
-        {0, {kDpadUp}},
-        {4499, {kDpadUp}},
-        {4500, {kDpadUp, kDpadRight}},
-        {4501, {kDpadRight}},
-        {13500, {kDpadDown, kDpadRight}},
-        {18000, {kDpadDown}},
-        {22500, {kDpadDown, kDpadLeft}},
-        {27000, {kDpadLeft}},
-        {31500, {kDpadUp, kDpadLeft}},
-        {31501, {kDpadUp}},
-        {35999, {kDpadUp}},
-    };
-    for (const Case& c : cases)
-    {
-        DIJOYSTATE2 state = CentredJoystick();
-        state.rgdwPOV[0] = c.pov;
-        EXPECT_EQ(FrameOf(state), c.expected) << "POV " << c.pov;
-    }
-}
-
-TEST(JoystickFrame, LeftStickCountsBeyond500AndZeroesBelow100)
-{
-    struct Case
-    {
-        std::int32_t value;
-        Entries fromY;
-        Entries fromX;
-        std::int32_t stored;
-    };
-    const Case cases[] = {
-        {-501, {kLeftStickUp}, {kLeftStickLeft}, -501},
-        {-500, {}, {}, -500},
-        {500, {}, {}, 500},
-        {501, {kLeftStickDown}, {kLeftStickRight}, 501},
-        {-100, {}, {}, -100},
-        {-99, {}, {}, 0},
-        {99, {}, {}, 0},
-        {100, {}, {}, 100},
-    };
-    for (const Case& c : cases)
-    {
-        DIJOYSTATE2 vertical = CentredJoystick();
-        vertical.lY = c.value;
-        EXPECT_EQ(FrameOf(vertical), c.fromY) << "lY " << c.value;
-        EXPECT_EQ(vertical.lY, c.stored) << "lY " << c.value;
-
-        DIJOYSTATE2 horizontal = CentredJoystick();
-        horizontal.lX = c.value;
-        EXPECT_EQ(FrameOf(horizontal), c.fromX) << "lX " << c.value;
-        EXPECT_EQ(horizontal.lX, c.stored) << "lX " << c.value;
-    }
-}
-
-TEST(JoystickFrame, RightStickTakesTheFurtherDeflectedAxisPair)
-{
-    struct Case
-    {
-        std::int32_t z, rz, rx, ry;
-        std::int32_t storedZ, storedRz;
-        Entries expected;
-    };
-    const Case cases[] = {
-        {0, 0, 300, -700, 300, -700, {kRightStickUp}},
-        {800, 0, -300, 0, 800, 0, {kRightStickRight}},
-        {-600, 600, 600, -600, -600, 600, {kRightStickDown, kRightStickLeft}},
-        {0, 50, 0, 99, 0, 0, {}},
-    };
-    for (const Case& c : cases)
-    {
-        DIJOYSTATE2 state = CentredJoystick();
-        state.lZ = c.z;
-        state.lRz = c.rz;
-        state.lRx = c.rx;
-        state.lRy = c.ry;
-        EXPECT_EQ(FrameOf(state), c.expected);
-        EXPECT_EQ(state.lZ, c.storedZ);
-        EXPECT_EQ(state.lRz, c.storedRz);
-    }
-}
-
-TEST(JoystickFrame, RightStickSwapsBeforeItInverts)
-{
-    struct Case
-    {
-        RightStickOptions options;
-        std::int32_t storedZ, storedRz;
-        Entries expected;
-    };
-    // The stick is pushed right: lZ 600.
-    const Case cases[] = {
-        {{false, false, false}, 600, 0, {kRightStickRight}},
-        {{true, false, false}, 0, 600, {kRightStickDown}},
-        {{false, false, true}, -600, 0, {kRightStickLeft}},
-        {{true, true, false}, 0, -600, {kRightStickUp}},
-        {{false, true, false}, 600, 0, {kRightStickRight}},
-    };
-    for (const Case& c : cases)
-    {
-        DIJOYSTATE2 state = CentredJoystick();
-        state.lZ = 600;
-        EXPECT_EQ(FrameOf(state, c.options), c.expected);
-        EXPECT_EQ(state.lZ, c.storedZ);
-        EXPECT_EQ(state.lRz, c.storedRz);
-    }
-}
-
-TEST(JoystickFrame, EachOfThe36ButtonsSetsOnlyItsOwnEntry)
-{
-    for (int button = 0; button < kJoyFrameButtons; ++button)
-    {
-        DIJOYSTATE2 state = CentredJoystick();
-        // Buttons past the 32 the layer keeps as 0 or 1 arrive as the
-        // device reports them.
-        state.rgbButtons[button] = button < 32 ? 1 : 0x80;
-        EXPECT_EQ(FrameOf(state), Entries{JoyButtonCode(button)}) << "button " << button;
-    }
-    DIJOYSTATE2 state = CentredJoystick();
-    state.rgbButtons[36] = 0x80;
-    EXPECT_EQ(FrameOf(state), Entries{});
-}
-
-TEST(XInputFrame, ThumbsRestInside6000AndPointFrom16383)
-{
-    struct Case
-    {
-        std::int16_t value;
-        std::int16_t stored;
-        Entries fromX;
-        Entries fromY;
-    };
-    const Case cases[] = {
-        {6000, 0, {}, {}},
-        {-6000, 0, {}, {}},
-        {6001, 6001, {}, {}},
-        {16382, 16382, {}, {}},
-        {16383, 16383, {kLeftStickRight}, {kLeftStickUp}},
-        {-16382, -16382, {}, {}},
-        {-16383, -16383, {kLeftStickLeft}, {kLeftStickDown}},
-    };
-    for (const Case& c : cases)
-    {
-        XINPUT_GAMEPAD horizontal = {};
-        horizontal.sThumbLX = c.value;
-        EXPECT_EQ(FrameOf(horizontal), c.fromX) << "sThumbLX " << c.value;
-        EXPECT_EQ(horizontal.sThumbLX, c.stored);
-
-        XINPUT_GAMEPAD vertical = {};
-        vertical.sThumbLY = c.value;
-        EXPECT_EQ(FrameOf(vertical), c.fromY) << "sThumbLY " << c.value;
-        EXPECT_EQ(vertical.sThumbLY, c.stored);
-    }
-}
-
-TEST(XInputFrame, TriggersPressFrom128)
-{
-    const std::pair<std::uint8_t, Entries> cases[] = {
-        {0, {}}, {127, {}}, {128, {kButton5}}, {255, {kButton5}}};
-    for (const auto& [value, expected] : cases)
-    {
-        XINPUT_GAMEPAD left = {};
-        left.bLeftTrigger = value;
-        EXPECT_EQ(FrameOf(left), expected) << "left " << int(value);
-
-        XINPUT_GAMEPAD right = {};
-        right.bRightTrigger = value;
-        Entries expectedRight = expected.empty() ? Entries{} : Entries{kButton6};
-        EXPECT_EQ(FrameOf(right), expectedRight) << "right " << int(value);
-    }
-}
-
-TEST(XInputFrame, RightStickDirectionsKeepXInputsSignAndFollowTheOptions)
-{
-    struct Case
-    {
-        std::int16_t rx, ry;
-        RightStickOptions options;
-        std::int16_t storedRx, storedRy;
-        Entries expected;
-    };
-    const Case cases[] = {
-        {0, 20000, {}, 0, 20000, {kRightStickDown}},
-        {0, -20000, {}, 0, -20000, {kRightStickUp}},
-        {-20000, 0, {}, -20000, 0, {kRightStickLeft}},
-        {20000, 0, {true, false, false}, 0, 20000, {kRightStickDown}},
-        {20000, 0, {true, true, false}, 0, -20000, {kRightStickUp}},
-        {20000, 0, {false, false, true}, -20000, 0, {kRightStickLeft}},
-        {0, 6000, {true, false, false}, 0, 0, {}},
-        // Fully down, inverted, is fully up rather than wrapping around.
-        {-32768, -32768, {false, true, true}, 32767, 32767, {kRightStickDown, kRightStickRight}},
-    };
-    for (const Case& c : cases)
-    {
-        XINPUT_GAMEPAD pad = {};
-        pad.sThumbRX = c.rx;
-        pad.sThumbRY = c.ry;
-        EXPECT_EQ(FrameOf(pad, c.options), c.expected) << c.rx << ", " << c.ry;
-        EXPECT_EQ(pad.sThumbRX, c.storedRx);
-        EXPECT_EQ(pad.sThumbRY, c.storedRy);
-    }
-}
-
 } // namespace
+
+// Axes are lX, lY, lZ, lRx, lRy, lRz, as given and as left behind: the dead
+// zone, the choice of the right stick's pair, its swap and inversion.
+TEST(JoystickFrame, DirectionsCountBeyond500AndAxesRestBelow100)
+{
+    constexpr std::uint32_t kCentred = 0xFFFFFFFF;
+    using Axes = std::array<std::int32_t, 6>;
+    const std::tuple<Axes, std::uint32_t, RightStickOptions, Entries, Axes> rows[] = {
+        {{}, 0xFFFF, {}, {}, {}},
+        {{}, 4500, {}, {kDpadUp, kDpadRight}, {}},
+        {{}, 18000, {}, {kDpadDown}, {}},
+        {{}, 31500, {}, {kDpadUp, kDpadLeft}, {}},
+        {{0, -501}, kCentred, {}, {kLeftStickUp}, {0, -501}},
+        {{-500, 500}, kCentred, {}, {}, {-500, 500}},
+        {{501, 501}, kCentred, {}, {kLeftStickDown, kLeftStickRight}, {501, 501}},
+        {{-501, 99}, kCentred, {}, {kLeftStickLeft}, {-501, 0}},
+        {{100, -99}, kCentred, {}, {}, {100, 0}},
+        {{0, 0, 0, 300, -700, 0}, kCentred, {}, {kRightStickUp}, {0, 0, 300, 300, -700, -700}},
+        {{0, 0, 800, -300}, kCentred, {}, {kRightStickRight}, {0, 0, 800, -300}},
+        {{0, 0, 0, 0, 99, 50}, kCentred, {}, {}, {0, 0, 0, 0, 99, 0}},
+        {{0, 0, 600}, kCentred, {true, true, false}, {kRightStickUp}, {0, 0, 0, 0, 0, -600}},
+        {{0, 0, 600}, kCentred, {false, false, true}, {kRightStickLeft}, {0, 0, -600}}};
+    for (const auto& [a, pov, options, entries, after] : rows)
+    {
+        DIJOYSTATE2 state = {};
+        std::memcpy(&state, a.data(), sizeof a); // lX to lRz lead the structure
+        state.rgdwPOV[0] = pov;
+        PadFrame frame = {};
+        FillFrameFromJoystick(state, options, frame);
+        EXPECT_EQ(SetEntries(frame), entries) << "POV " << pov << " lX " << a[0];
+        EXPECT_EQ(std::memcmp(&state, after.data(), sizeof after), 0)
+            << "POV " << pov << " lX " << a[0];
+    }
+}
+
+// A button b feeds the entry named after it ("BUTTON" b + 1), except the
+// stick pushes on buttons 10 and 11; those after the 36th feed nothing.
+TEST(JoystickFrame, EachOfThe36ButtonsSetsTheEntryNamedAfterIt)
+{
+    for (int button = 0; button <= kJoyFrameButtons; ++button)
+    {
+        DIJOYSTATE2 state = {};
+        state.rgdwPOV[0] = 0xFFFFFFFF;
+        state.rgbButtons[button] = 0x80;
+        PadFrame frame = {};
+        FillFrameFromJoystick(state, {}, frame);
+        std::string names;
+        for (int entry : SetEntries(frame))
+            names += PadButtonName(static_cast<std::uint8_t>(entry));
+        const std::string name = button == 10   ? "LS_PUSH"
+                                 : button == 11 ? "RS_PUSH"
+                                                : "BUTTON" + std::to_string(button + 1);
+        EXPECT_EQ(names, button < kJoyFrameButtons ? name : "") << button;
+    }
+}
+
+// Triggers, then thumbs sThumbLX, sThumbLY, sThumbRX, sThumbRY as given and
+// as left behind. XInput counts up as positive; the right stick keeps that.
+TEST(XInputFrame, ThumbsRestUpTo6000AndPointFrom16383TriggersPressFrom128)
+{
+    using Thumbs = std::array<std::int16_t, 4>;
+    using Row = std::tuple<std::uint8_t, std::uint8_t, Thumbs, RightStickOptions, Entries, Thumbs>;
+    const Row rows[] = {
+        {127, 128, {}, {}, {kButton6}, {}},
+        {128, 127, {}, {}, {kButton5}, {}},
+        {0, 0, {6000, -6000, 6001, -6001}, {}, {}, {0, 0, 6001, -6001}},
+        {0, 0, {16382, -16382}, {}, {}, {16382, -16382}},
+        {0, 0, {16383, 16383}, {}, {kLeftStickUp, kLeftStickRight}, {16383, 16383}},
+        {0, 0, {-16383, -16383}, {}, {kLeftStickDown, kLeftStickLeft}, {-16383, -16383}},
+        {0, 0, {0, 0, 0, 17000}, {}, {kRightStickDown}, {0, 0, 0, 17000}},
+        {0, 0, {0, 0, 17000, 0}, {true, true, false}, {kRightStickUp}, {0, 0, 0, -17000}},
+        {0, 0, {0, 0, 17000, 0}, {false, false, true}, {kRightStickLeft}, {0, 0, -17000, 0}},
+        // Fully down, inverted, is fully up rather than wrapping around.
+        {0, 0, {0, 0, -32768, 0}, {false, false, true}, {kRightStickRight}, {0, 0, 32767, 0}}};
+    for (const auto& [left, right, t, options, entries, after] : rows)
+    {
+        XINPUT_GAMEPAD pad = {0, left, right, t[0], t[1], t[2], t[3]};
+        PadFrame frame = {};
+        FillFrameFromXInput(pad, options, frame);
+        EXPECT_EQ(SetEntries(frame), entries) << t[0] << ", " << t[2];
+        EXPECT_EQ((Thumbs{pad.sThumbLX, pad.sThumbLY, pad.sThumbRX, pad.sThumbRY}), after)
+            << t[0] << ", " << t[2];
+    }
+}
+
+// The movement keys force a stick to full deflection; without them it keeps
+// the device's value.
+TEST(SlotSticks, MovementKeysForceFullDeflection)
+{
+    using Axis = float InputSlot::*;
+    const std::tuple<int, Axis, float> rows[] = {
+        {4, &InputSlot::leftY, -1.0f},   {5, &InputSlot::leftY, 1.0f},
+        {6, &InputSlot::leftX, -1.0f},   {7, &InputSlot::leftX, 1.0f},
+        {9, &InputSlot::rightY, -1.0f},  {10, &InputSlot::rightY, 1.0f},
+        {11, &InputSlot::rightX, -1.0f}, {12, &InputSlot::rightX, 1.0f},
+        {13, &InputSlot::rightX, 0.5f}};
+    for (const auto& [action, axis, value] : rows)
+    {
+        InputSlot slot = {};
+        slot.analogValid = 1;
+        slot.leftX = slot.leftY = slot.rightX = slot.rightY = 0.5f;
+        slot.current[kFirstVirtualButton + action] = 1;
+        ApplyDigitalOverrides(slot);
+        EXPECT_EQ(slot.*axis, value) << action;
+    }
+}
+
+// Where a key has several names the first is shown; codes without a key or
+// beyond either table show nothing.
+TEST(NameTables, KeysShowTheirPrimaryNamesAndPadCodesCountOnFromButton13)
+{
+    const std::pair<int, const char*> keys[] = {
+        {0x00, ""},      {0x38, "LMENU"}, {0x3A, "CAPITAL"},     {0x54, ""}, {0x98, ""},
+        {0xC9, "PRIOR"}, {0xD1, "NEXT"},  {0xED, "MEDIASELECT"}, {0xEE, ""}, {0xFD, ""}};
+    for (const auto& [code, name] : keys)
+        EXPECT_STREQ(KeyName(static_cast<std::uint8_t>(code)), name) << code;
+    EXPECT_STREQ(PadButtonName(24), "BUTTON13");
+    EXPECT_STREQ(PadButtonName(63), "BUTTON52");
+    EXPECT_STREQ(PadButtonName(64), "");
+}

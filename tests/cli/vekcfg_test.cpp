@@ -1,0 +1,252 @@
+// Every command of vekcfg with each of its outcomes, and the reports a user
+// reads, run in the test's own process as the entry runs them. Paths are
+// absolute: the messages name them as given.
+#include "cli/command_line.h"
+#include "cli/encoding.h"
+#include "cli/platform.h"
+#include "cli/vekcfg.h"
+#include "config/save_config.h"
+#include "tests/support/audio_fixtures.h"
+#include "tests/support/temp_folder.h"
+
+#include <cstring>
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <tuple>
+
+namespace cli_testing
+{
+
+// What was printed, as UTF-8 with LF, whatever the platform printed.
+std::string Utf8FromConsole(const std::string& printed);
+
+namespace
+{
+
+using testing_support::ReadBytes;
+
+struct ProgramRun
+{
+    int exitCode;
+    std::string out;
+    std::string err;
+};
+
+ProgramRun Vekcfg(const std::vector<std::string>& arguments)
+{
+    std::vector<const char*> argv;
+    for (const std::string& argument : arguments)
+        argv.push_back(argument.c_str());
+    testing::internal::CaptureStdout();
+    testing::internal::CaptureStderr();
+    const int exitCode = cli::RunVekcfg(static_cast<int>(argv.size()), argv.data());
+    const std::string out = Utf8FromConsole(testing::internal::GetCapturedStdout());
+    return {exitCode, out, Utf8FromConsole(testing::internal::GetCapturedStderr())};
+}
+
+std::string Utf8(const char8_t* text)
+{
+    return reinterpret_cast<const char*>(text);
+}
+
+const std::string kAccepted = Utf8(u8"テンションファイル作成成功!!\n");
+const std::string kNoMusic = Utf8(u8"BGMファイルが開けません\n");
+const std::string kClimaxOver =
+    Utf8(u8"ClimaxTension 時間オーバー[現在 30.000000 秒です 18 秒以内にしてください]\n"
+         u8"Time Data IsCorrect Error!!\n変換エラー!!\n");
+
+// 180 s of music and the worked example: Normal 30, Low 105, Hi 30 of at
+// most 36, Climax 15 of at most 18, the finale at 170; the same with the
+// climax from 150 fails.
+class Commands : public testing::Test
+{
+protected:
+    Commands()
+    {
+        testing_support::WriteBytes(music, testing_support::MakeWaveOfLength(180.0));
+        Write(example, "FILENAME:Test;\nLOW:30;\nHI:60;\nLOW:90;\nCLIMAX:165;\nFINALE:170;\n");
+        Write(climax, "FILENAME:Test;\nLOW:30;\nHI:60;\nLOW:90;\nCLIMAX:150;\nFINALE:170;\n");
+    }
+    static void Write(const std::string& path, const std::string& bytes)
+    {
+        testing_support::WriteBytes(path, std::vector<std::uint8_t>(bytes.begin(), bytes.end()));
+    }
+
+    testing_support::TempFolder folder;
+    const std::string music = folder.File("music.wav"), missing = folder.File("missing.wav");
+    const std::string example = folder.File("example.txt"), climax = folder.File("climax.txt");
+    const std::string settings = folder.File("GameConfig.dat");
+};
+
+// The conversion every printed text goes through.
+TEST(Utf8FromCp932, MapsTheToolsTextsAndReplacesWhatTheCodePageLacksOneCharacterEach)
+{
+    const std::pair<std::string, std::string> cases[] = {
+        {"表示", Utf8(u8"表示")},              // a trail byte 5C is no backslash
+        {"\x81\x60", Utf8(u8"\uFF5E")},        // the tilde of the messages
+        {"\x81\x7E", Utf8(u8"×")},             // the resolutions' sign
+        {"\xB1\xB2", Utf8(u8"\uFF71\uFF72")},  // half-width katakana
+        {"a\x81", "a" + Utf8(u8"\uFFFD")},     // a lead byte at the end
+        {"\x81\"x", Utf8(u8"\uFFFD") + "\"x"}, // a lead byte before a non-trail
+        {"\x85\x40z", Utf8(u8"\uFFFD") + "z"}, // an unassigned pair is one character
+        {std::string("a\0b", 3), std::string("a\0b", 3)}};
+    for (const auto& [cp932, utf8] : cases)
+        EXPECT_EQ(cli::Utf8FromCp932(cp932), utf8) << utf8;
+}
+
+TEST_F(Commands, CheckPrintsWhatTheCheckButtonShowsAndExitsOneOnFailure)
+{
+    const std::tuple<std::string, std::string, std::string, int> rows[] = {
+        {music, example, kAccepted, 0},
+        {music, climax, kClimaxOver, 1},
+        {missing, example, kNoMusic, 1}};
+    for (const auto& [musicPath, tensionPath, out, exitCode] : rows)
+    {
+        const ProgramRun run = Vekcfg({"check", musicPath, tensionPath});
+        EXPECT_EQ(run.out, out) << tensionPath;
+        EXPECT_EQ(run.exitCode, exitCode) << tensionPath;
+        EXPECT_EQ(run.err, "") << tensionPath;
+    }
+}
+
+TEST_F(Commands, DetailsAndThePictureShowTheTimeline)
+{
+    const ProgramRun details = Vekcfg({"check", "--details", music, example});
+    for (const char* line :
+         {"music length: 180.000 s\n", "name: \"Test\" (4 bytes; from its file-name entry)\n",
+          "    90.000   165.000  LowTension\n",
+          "  HiTension       30.000 s of 36 s      1 of 4 segments\n",
+          "finale: 170.000 s, window 3.600 s (to 173.600 s), ClimaxTension there\n"})
+        EXPECT_NE(details.out.find(line), std::string::npos) << line;
+
+    const std::string svg = folder.File("t.svg");
+    EXPECT_EQ(Vekcfg({"check", "--svg", svg, music, climax}).exitCode, 1);
+    const std::vector<std::uint8_t> bytes = ReadBytes(svg);
+    const std::string picture(bytes.begin(), bytes.end());
+    for (const char8_t* part : {u8"<svg ", u8"class=\"finale-window\"", u8"変換エラー!!",
+                                u8"data-level=\"ClimaxTension\" data-from=\"150.000\""})
+        EXPECT_NE(picture.find(Utf8(part)), std::string::npos) << Utf8(part);
+    const ProgramRun unwritable =
+        Vekcfg({"check", "--svg", folder.File("no/t.svg"), music, example});
+    EXPECT_EQ(unwritable.out, kAccepted);
+    EXPECT_EQ(unwritable.exitCode, 2);
+}
+
+TEST_F(Commands, CheckConfigChecksEveryRowWithMusicOneLineEach)
+{
+    config::CSaveConfig record;
+    record.ResetAll();
+    const std::string rows[][2] = {
+        {music, example}, {missing, example}, {"", example}, {music, climax}};
+    for (int row = 0; row < 4; ++row)
+    {
+        std::strcpy(record.UserBgm()->rows[row].musicPath, rows[row][0].c_str());
+        std::strcpy(record.UserBgm()->rows[row].tensionPath, rows[row][1].c_str());
+    }
+    ASSERT_TRUE(record.SaveToPath(settings.c_str()));
+    const ProgramRun run = Vekcfg({"check-config", settings});
+    EXPECT_EQ(run.out,
+              "1\t" + music + "\t" + example + "\t" + kAccepted + "2\t" + missing + "\t" + example +
+                  "\t" + kNoMusic + "4\t" + music + "\t" + climax + "\t" +
+                  Utf8(u8"ClimaxTension 時間オーバー[現在 30.000000 秒です 18 秒以内にしてく"
+                       u8"ださい] / Time Data IsCorrect Error!! / 変換エラー!!\n"));
+    EXPECT_EQ(run.exitCode, 1);
+}
+
+TEST_F(Commands, ShowPrintsEverySettingByNameWithItsMeaning)
+{
+    config::CSaveConfig record;
+    record.ResetAll();
+    record.Graphics()->screenSize = 8;
+    record.Graphics()->hdrLevel = 5;
+    record.Game()->bgmVolume = -10000;
+    record.Game()->seVolume = -1250;
+    config::IpEntry address{};
+    for (int i = 0; i < 4; ++i)
+        std::strcpy(address.octets[i], i < 3 ? "010" : "*");
+    record.AddConnectEntry(address);
+    record.AddAllowEntry(address);
+    record.Keys()->keyboardKeys[4] = 0x1C8; // the low byte names it
+    record.Keys()->padConfigs[1].buttons[14] = 200;
+    std::strcpy(record.RadioChat()->entries[1].text, "go\n\tnow\x01");
+    ASSERT_TRUE(record.SaveToPath(settings.c_str()));
+
+    const ProgramRun text = Vekcfg({"show", settings});
+    EXPECT_EQ(text.exitCode, 0);
+    for (const char8_t* line :
+         {u8"version = 318771200 (0x13001000)\n", u8"graphics.screenSize = 8 (1920×1080)\n",
+          u8"graphics.hdrLevel = 5 (no such choice)\n", u8"game.bgmVolume = -10000 (silent)\n",
+          u8"game.seVolume = -1250 (-12.50 dB)\n", u8"game.captureEnabled = 0 (off)\n",
+          u8"network.keyResponse = 1 (2)\n", u8"network.connectList[0] = \"10.10.10.0\"\n",
+          u8"network.allowList[0] = \"010.010.010.*\"\n", u8"network.denyList = (none)\n",
+          u8"replay.replayLock[29] = 0 (リプレイ30: unlocked)\n",
+          u8"keys.keyboardKeys[4] = 456 (移動上: UP)\n",
+          u8"keys.padConfigs[1].buttons[14] = 200 (スライド/決定: (no name))\n",
+          u8"keys.padConfigs[1].device = 1 (2P: game controller 1 in enumeration order)\n",
+          u8"radioChat.entries[1].text = \"go\\n\\tnow\\x01\" (F2)\n",
+          u8"radioChat.entries[11].notToAll = 0 (F12: to everyone (全体 checked))\n"})
+        EXPECT_NE(text.out.find(Utf8(line)), std::string::npos) << Utf8(line);
+
+    const ProgramRun json = Vekcfg({"show", "--json", settings});
+    EXPECT_EQ(json.exitCode, 0);
+    for (const char8_t* part : {u8"\"screenSize\": {\"value\": 8, \"meaning\": \"1920×1080\"}",
+                                u8"\"port\": 18000,", u8"\"value\": \"go\\n\\tnow\\u0001\""})
+        EXPECT_NE(json.out.find(Utf8(part)), std::string::npos) << Utf8(part);
+}
+
+TEST_F(Commands, UsageErrorsAndUnreadableFilesExitTwoWithTheReason)
+{
+    const std::string newer = folder.File("newer.dat");
+    Write(newer, std::string("\x01\x10\x00\x13", 4));
+    const std::pair<std::vector<std::string>, std::string> rows[] = {
+        {{}, "vekcfg: no command given\nusage: vekcfg check"},
+        {{"check", "--svg"}, "vekcfg: --svg needs the path of the picture to write\nusage: "},
+        {{"check", "--bogus", "m", "t"},
+         "vekcfg: unknown or repeated option \"--bogus\" for check\n"},
+        {{"show", missing}, "vekcfg: cannot read the settings file \"" + missing + "\": "},
+        {{"check-config", newer},
+         "has version 0x13001001; this tool reads versions up to 0x13001000\n"}};
+    for (const auto& [arguments, reason] : rows)
+    {
+        const ProgramRun run = Vekcfg(arguments);
+        EXPECT_EQ(run.exitCode, 2) << reason;
+        EXPECT_EQ(run.out, "") << reason;
+        EXPECT_NE(run.err.find(reason), std::string::npos) << run.err;
+    }
+}
+
+// The tool's own file, found from TEMP as the tool finds it, where the
+// platform has one; it is read, never made.
+TEST_F(Commands, WithoutFileTheToolsOwnFileIsShownWhereThereIsOne)
+{
+    testing_support::TempSaveFolder save;
+    std::filesystem::create_directories(save.Root().Path() / "Temp");
+    std::filesystem::create_directories(save.SaveDirectory());
+    config::CSaveConfig record;
+    record.ResetAll();
+    record.Network()->port = 12345;
+    ASSERT_TRUE(record.SaveToPath(save.SettingsFile().c_str()));
+    std::string own, reason;
+    const bool hasOwn = cli::DefaultSettingsPath(&own, &reason);
+    const ProgramRun shown = Vekcfg({"show"});
+    EXPECT_EQ(shown.exitCode, hasOwn ? 0 : 2);
+    EXPECT_NE(hasOwn ? shown.out.find("network.port = 12345\n")
+                     : shown.err.find(reason + "\nusage: "),
+              std::string::npos);
+    std::filesystem::remove(save.SettingsFile());
+    EXPECT_EQ(Vekcfg({"check-config"}).exitCode, 2);
+    EXPECT_FALSE(std::filesystem::exists(save.SettingsFile()));
+}
+
+TEST_F(Commands, HelpAndVersionExitZero)
+{
+    const ProgramRun help = Vekcfg({"show", "x", "-h"});
+    EXPECT_EQ(help.exitCode, 0);
+    EXPECT_EQ(help.out.rfind("vekcfg " + std::string(cli::kVersion) + ": the command-line", 0), 0u);
+    const ProgramRun version = Vekcfg({"--version"});
+    EXPECT_EQ(version.out, "vekcfg " + std::string(cli::kVersion) + "\n");
+    EXPECT_EQ(version.exitCode, 0);
+}
+
+} // namespace
+} // namespace cli_testing
