@@ -14,10 +14,7 @@ TEST(CRuntime, TextModeJoinsCrLfKeepsLoneCrAndStopsAtCtrlZ)
         {"c\rd\r", "c\rd\r"},                      // a lone CR, also at the end
         {std::string("x\r\x1A\nrest", 7), "x\r"}}; // Ctrl-Z ends the text
     for (auto [bytes, text] : cases)
-    {
-        bytes.resize(base::TranslateTextMode(bytes.data(), bytes.size()));
-        EXPECT_EQ(bytes, text);
-    }
+        EXPECT_EQ(bytes.substr(0, base::TranslateTextMode(bytes.data(), bytes.size())), text);
 }
 
 TEST(CRuntime, NumbersReadAsTheWindowsAtofReadsThem)

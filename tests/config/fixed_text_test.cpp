@@ -5,35 +5,28 @@
 
 #include <gtest/gtest.h>
 #include <string>
+#include <tuple>
 
 TEST(FixedText, EachFieldKeepsWhatItsLimitAllowsAndReadsWithoutItsLastByte)
 {
     std::string kana = "a";
     for (int i = 0; i < 18; ++i)
         kana += "ぁ";
-    const struct
+    using namespace config;
+    // The capacity, the limit, the text given and the text kept.
+    const std::tuple<std::size_t, std::size_t, std::string, std::string> cases[] = {
+        {kPathCapacity, kPathTextLimit, std::string(258, 'p') + "表", std::string(258, 'p')},
+        {kIdCapacity, kIdTextLimit, std::string(29, 'i') + "表表", std::string(29, 'i') + "表"},
+        {kRadioChatTextCapacity, kRadioChatTextLimit, kana + "ぁ", kana},
+        {4, kOctetTextLimit, "1234", "123"}};
+    for (const auto& [capacity, limit, given, kept] : cases)
     {
-        const char* kind;
-        std::size_t capacity;
-        std::size_t limit;
-        std::string given;
-        std::string kept;
-    } cases[] = {{"path", config::kPathCapacity, config::kPathTextLimit,
-                  std::string(258, 'p') + "表", std::string(258, 'p')},
-                 {"id", config::kIdCapacity, config::kIdTextLimit, std::string(29, 'i') + "表表",
-                  std::string(29, 'i') + "表"},
-                 {"radio chat", config::kRadioChatTextCapacity, config::kRadioChatTextLimit,
-                  kana + "ぁ", kana},
-                 {"octet", 4, config::kOctetTextLimit, "1234", "123"}};
-    for (const auto& c : cases)
-    {
-        std::string field(c.capacity, 'z');
-        config::StoreFieldText(field.data(), c.capacity, c.limit, c.given);
-        EXPECT_EQ(field, c.kept + std::string(c.capacity - c.kept.size(), '\0')) << c.kind;
-        EXPECT_EQ(config::FieldText(field.data(), c.capacity), c.kept) << c.kind;
-        const std::string unterminated(c.capacity, 'x');
-        EXPECT_EQ(config::FieldText(unterminated.data(), c.capacity),
-                  std::string(c.capacity - 1, 'x'))
-            << c.kind;
+        std::string field(capacity, 'z');
+        StoreFieldText(field.data(), capacity, limit, given);
+        EXPECT_EQ(field, kept + std::string(capacity - kept.size(), '\0')) << capacity;
+        EXPECT_EQ(FieldText(field.data(), capacity), kept) << capacity;
+        const std::string unterminated(capacity, 'x');
+        EXPECT_EQ(FieldText(unterminated.data(), capacity), std::string(capacity - 1, 'x'))
+            << capacity;
     }
 }

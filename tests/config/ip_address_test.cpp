@@ -11,8 +11,8 @@
 TEST(IpOctet, TextsAreStoredAsThreeDigitsOrTheWildcardOrRefused)
 {
     const std::pair<const char*, const char*> accepted[] = {
-        {"1", "001"},   {"01", "001"}, {"001", "001"}, {"abc", "000"},
-        {"*", "*\0\0"}, {"**", "000"}, {"255", "255"}, {" +7x", "007"}};
+        {"1", "001"},  {"001", "001"}, {"abc", "000"}, {"*", "*\0\0"},
+        {"**", "000"}, {"255", "255"}, {" +7x", "007"}};
     for (const auto& [text, stored] : accepted)
     {
         char octet[4] = {'9', '9', '9', '9'};
@@ -38,15 +38,16 @@ TEST(LeadingInteger, ReadsAsAtoiAndSaturatesWhereAtoiWouldOverflow)
     for (const char* high : {"2147483647", "2147483648", "99999999999999999999999"})
         EXPECT_EQ(config::ReadLeadingInteger(high), INT_MAX) << high;
     EXPECT_EQ(config::ReadLeadingInteger("-2147483649"), INT_MIN);
-    const std::pair<const char*, int> ports[] = {
-        {"70000", 4464}, {"-1", 65535}, {"", 0}, {"8080x", 8080}, {"99999999999", 65535}};
-    for (const auto& [text, port] : ports)
+    for (const auto& [text, port] :
+         {std::pair{"70000", 4464}, {"-1", 65535}, {"99999999999", 65535}})
         EXPECT_EQ(config::ReadPort(text), port) << text;
 }
 
 // The 接続 list shows numbers, the others the octets as stored; an octet
-// from a file that fills all four bytes ends before its last.
-TEST(AddressLines, ConnectShowsNumbersAndTheOtherListsTheStoredOctets)
+// from a file that fills all four bytes ends before its last. A line of the
+// 接続 list stands for a slot: each filled one, and a free one while it
+// holds the all-zero address just entered.
+TEST(AddressLines, ConnectShowsTheFilledSlotsAsNumbersAndTheOtherListsTheStoredOctets)
 {
     config::IpEntry entry{};
     const char* typed[] = {"192", "168", "0", "*"};
@@ -57,12 +58,6 @@ TEST(AddressLines, ConnectShowsNumbersAndTheOtherListsTheStoredOctets)
     std::memcpy(&entry, "1234567890123456", sizeof entry);
     EXPECT_EQ(config::ConnectLine(entry), "123.567.901.345");
     EXPECT_EQ(config::ListedLine(entry), "123.567.901.345");
-}
-
-// A line of the 接続 list stands for a slot: each filled one, and a free
-// one while it holds the all-zero address just entered.
-TEST(AddressLines, ConnectLinesAreTheFilledSlotsAndTheEnteredFreeOne)
-{
     config::ConfigNetwork network{};
     std::memcpy(&network.connectList[2], "001", 4);
     std::memcpy(&network.connectList[5], "002", 4);
@@ -72,7 +67,6 @@ TEST(AddressLines, ConnectLinesAreTheFilledSlotsAndTheEnteredFreeOne)
 
 TEST(VolumeSlider, OnlyTheLeftEndMeansSilence)
 {
-    EXPECT_EQ(config::VolumeAtSliderPosition(-3000), -10000);
-    EXPECT_EQ(config::VolumeAtSliderPosition(-2999), -2999);
-    EXPECT_EQ(config::VolumeAtSliderPosition(0), 0);
+    for (const auto& [position, volume] : {std::pair{-3000, -10000}, {-2999, -2999}, {0, 0}})
+        EXPECT_EQ(config::VolumeAtSliderPosition(position), volume);
 }

@@ -15,16 +15,9 @@ using Bytes = std::vector<std::uint8_t>;
 
 namespace fs = std::filesystem;
 
-namespace
-{
-Bytes DefaultImage()
-{
-    CSaveConfig record;
-    record.ResetAll();
-    return record.SaveToBytes();
-}
-} // namespace
-
+// Windows refuses paths of MAX_PATH (260) bytes and more to a program that
+// does not opt in to long paths; the file is written beside itself first,
+// under a name of the same length, so a settings path of 259 bytes works.
 TEST(SaveDirectory, IsBuiltBesideTheLastFolderOfTempOrRefused)
 {
     TempFolder root;
@@ -50,72 +43,54 @@ TEST(SaveDirectory, IsBuiltBesideTheLastFolderOfTempOrRefused)
     }
     EXPECT_TRUE(fs::is_directory(root.Path() / "Tolvenik" / "VEK"));
 
-    ScopedEnvironment unset("TEMP", nullptr);
+    const std::string kept = PathOfLength(root, 259 - 27 - 1, ""); // 27: the parts made
+    ASSERT_FALSE(kept.empty());
+    fs::create_directory(kept);
     CSaveConfig record;
+    {
+        ScopedEnvironment temp("TEMP", (kept + sep + "Temp").c_str());
+        ASSERT_TRUE(record.Load());
+        EXPECT_EQ(ReadBytes(kept + sep + made + "GameConfig.dat").size(), 6876u);
+    }
+    ScopedEnvironment unset("TEMP", nullptr);
     EXPECT_FALSE(record.Load());
     EXPECT_FALSE(record.Save());
 }
 
-TEST(SaveFile, AMissingOrTooShortFileIsWrittenWithTheDefaults)
+// A missing or too short file is written with the defaults; a failed save
+// leaves the previous file byte for byte.
+TEST(SaveFile, AMissingFileIsWrittenAndAFailedSaveLeavesThePreviousOne)
 {
     TempSaveFolder folder;
     CSaveConfig record;
     ASSERT_TRUE(record.Load());
-    EXPECT_EQ(ReadBytes(folder.SettingsFile()), DefaultImage());
+    const Bytes defaults = ReadBytes(folder.SettingsFile());
+    EXPECT_EQ(defaults.size(), 6876u);
     EXPECT_FALSE(fs::exists(base::TemporaryPathFor(folder.SettingsFile())));
     WriteBytes(folder.SettingsFile(), {0x00, 0x10, 0x00});
     ASSERT_TRUE(record.Load());
-    EXPECT_EQ(ReadBytes(folder.SettingsFile()), DefaultImage());
+    EXPECT_EQ(ReadBytes(folder.SettingsFile()), defaults);
+    // The temporary file cannot be created: a folder stands at its name.
+    fs::create_directories(base::TemporaryPathFor(folder.SettingsFile()));
+    record.Graphics()->screenSize = 5;
+    EXPECT_FALSE(record.Save());
+    EXPECT_EQ(ReadBytes(folder.SettingsFile()), defaults);
+    fs::remove(base::TemporaryPathFor(folder.SettingsFile()));
+    ASSERT_TRUE(record.Save());
+    EXPECT_EQ(ReadBytes(folder.SettingsFile())[8], 5);
 }
 
 TEST(SaveFile, BadFilesAreRefusedAndLeftAsTheyWere)
 {
     TempSaveFolder folder;
     fs::create_directories(folder.SaveDirectory());
-    Bytes newer = DefaultImage();
-    newer[0] = 0x01; // version 0x13001001
+    const Bytes newer = {0x01, 0x10, 0x00, 0x13}; // version 0x13001001
     WriteBytes(folder.SettingsFile(), newer);
     CSaveConfig record;
     EXPECT_FALSE(record.Load());
     EXPECT_EQ(ReadBytes(folder.SettingsFile()), newer);
-
     fs::remove(folder.SettingsFile());
     fs::create_directories(fs::path(folder.SettingsFile()) / "inside");
     EXPECT_FALSE(record.Load()) << "a folder in place of the file";
     EXPECT_TRUE(fs::is_directory(fs::path(folder.SettingsFile()) / "inside"));
-}
-
-TEST(SaveFile, FailedSaveLeavesThePreviousFileByteForByte)
-{
-    TempSaveFolder folder;
-    CSaveConfig record;
-    ASSERT_TRUE(record.Load());
-    // The temporary file cannot be created: a folder stands at its name.
-    fs::create_directories(base::TemporaryPathFor(folder.SettingsFile()));
-    record.Graphics()->screenSize = 5;
-    EXPECT_FALSE(record.Save());
-    EXPECT_EQ(ReadBytes(folder.SettingsFile()), DefaultImage());
-
-    fs::remove(base::TemporaryPathFor(folder.SettingsFile()));
-    ASSERT_TRUE(record.Save());
-    EXPECT_EQ(ReadBytes(folder.SettingsFile())[8], 5);
-}
-
-// Windows refuses paths of MAX_PATH (260) bytes and more to a program that
-// does not opt in to long paths. The file is written beside itself first,
-// under a name of the same length, so that a settings path of 259 bytes
-// still works.
-TEST(SaveFile, ASettingsPathOf259BytesIsUsed)
-{
-    TempFolder root;
-    const std::string sep(1, base::PathSeparator());
-    // "Tolvenik", "VEK", "GameConfig.dat" and the separators before them.
-    const std::string kept = PathOfLength(root, 259 - 27 - 1, "");
-    ASSERT_FALSE(kept.empty());
-    fs::create_directory(kept);
-    ScopedEnvironment temp("TEMP", (kept + sep + "Temp").c_str());
-    CSaveConfig record;
-    ASSERT_TRUE(record.Load());
-    EXPECT_EQ(ReadBytes(kept + sep + "Tolvenik" + sep + "VEK" + sep + "GameConfig.dat").size(),
-              6876u);
 }

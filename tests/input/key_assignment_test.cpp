@@ -119,19 +119,3 @@ TEST(PadCapture, AButtonIsExchangedWithItsActionOrStoredAloneAndSticksAreNever)
         EXPECT_EQ(slot.current[kFirstVirtualButton + focused], changes.empty() ? 0u : 1u);
     }
 }
-
-TEST(FocusOrder, ShownBoxesAreVisitedInReadingOrderAndWrapAround)
-{
-    const auto walk = [](const std::int8_t(&order)[kActionCount], int first)
-    {
-        std::vector<int> visited = {first};
-        for (int action = order[first]; action != first && visited.size() <= kActionCount;
-             action = order[action])
-            visited.push_back(action);
-        return visited;
-    };
-    EXPECT_EQ(walk(kKeyboardFocusOrder, 4),
-              (std::vector<int>{4, 5, 6, 7, 14, 15, 16, 17, 19, 21, 18, 20, 8, 23, 22}));
-    EXPECT_EQ(walk(kPadFocusOrder, 14),
-              (std::vector<int>{14, 15, 16, 17, 19, 21, 18, 20, 8, 23, 22}));
-}

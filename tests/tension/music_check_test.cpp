@@ -8,6 +8,7 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <string>
+#include <tuple>
 
 using tension::MusicCheckResult;
 
@@ -21,12 +22,7 @@ TEST(MusicCheck, TheUserIsShownTheOutcomeOrTheWholeLogAndNeitherFileIsHeld)
     testing_support::WriteBytes(tension, {text.begin(), text.end()});
     testing_support::WriteBytes(music, testing_support::MakeWaveOfLength(120.0));
     testing_support::WriteBytes(shortMusic, testing_support::MakeWaveOfLength(30.0));
-    const struct
-    {
-        std::string music;
-        MusicCheckResult result;
-        std::string shown;
-    } cases[] = {
+    const std::tuple<std::string, MusicCheckResult, std::string> cases[] = {
         {folder.File("missing.wav"), MusicCheckResult::MusicUnreadable, "BGMファイルが開けません"},
         {music, MusicCheckResult::Accepted, "テンションファイル作成成功!!"},
         {shortMusic, MusicCheckResult::TensionRejected,
@@ -34,11 +30,11 @@ TEST(MusicCheck, TheUserIsShownTheOutcomeOrTheWholeLogAndNeitherFileIsHeld)
          "ファイル時間 エラー[30.000000秒のファイルです : 60秒以上の長さのファイルが必要です]\n"
          "Time Data IsCorrect Error!!\n変換エラー!!\n"},
     };
-    for (const auto& c : cases)
+    for (const auto& [row, result, shown] : cases)
     {
         tension::CTextString message("left over");
-        EXPECT_EQ(tension::CheckMusicRow(c.music.c_str(), tension.c_str(), &message), c.result);
-        EXPECT_EQ(message.CStr(), c.shown) << c.music;
+        EXPECT_EQ(tension::CheckMusicRow(row.c_str(), tension.c_str(), &message), result);
+        EXPECT_EQ(message.CStr(), shown) << row;
     }
     // Windows refuses to delete a file that is still open.
     for (const std::string& file : {tension, music, shortMusic})
