@@ -1,6 +1,7 @@
 #include "base/c_runtime.h"
 
 #include <charconv>
+#include <climits>
 #include <cmath>
 #include <string>
 
@@ -21,6 +22,17 @@ bool IsSpace(char c)
     return c == ' ' || (c >= '\t' && c <= '\r');
 }
 
+// Passes the white space and the sign that lead a number; true for a minus.
+bool SkipSpaceAndSign(const char*& text)
+{
+    while (IsSpace(*text))
+        ++text;
+    const bool negative = *text == '-';
+    if (*text == '-' || *text == '+')
+        ++text;
+    return negative;
+}
+
 } // namespace
 
 std::size_t TranslateTextMode(char* bytes, std::size_t size)
@@ -35,13 +47,25 @@ std::size_t TranslateTextMode(char* bytes, std::size_t size)
     return kept;
 }
 
+int ReadLeadingInteger(const char* text)
+{
+    const bool negative = SkipSpaceAndSign(text);
+    // Counted towards the negative end, which holds one more value.
+    long long value = 0;
+    for (; IsDigit(*text); ++text)
+    {
+        value = value * 10 - (*text - '0');
+        if (value < INT_MIN)
+            return negative ? INT_MIN : INT_MAX;
+    }
+    if (!negative)
+        return value < -INT_MAX ? INT_MAX : static_cast<int>(-value);
+    return static_cast<int>(value);
+}
+
 double ReadDecimal(const char* text)
 {
-    while (IsSpace(*text))
-        ++text;
-    const bool negative = *text == '-';
-    if (*text == '-' || *text == '+')
-        ++text;
+    const bool negative = SkipSpaceAndSign(text);
 
     // The number is rewritten in the one form from_chars takes, which reads
     // the same on every platform and in every locale. The power of ten of its

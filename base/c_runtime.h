@@ -14,6 +14,11 @@ namespace base
 // place and returns the new length.
 std::size_t TranslateTextMode(char* bytes, std::size_t size);
 
+// What atoi reads: white space, a sign and the leading decimal digits; 0 when
+// there are none. A number beyond the int range saturates, as in the Windows
+// runtime, where glibc's would wrap.
+int ReadLeadingInteger(const char* text);
+
 // What atof reads: white space, a sign, decimal digits with an optional
 // fraction, and an exponent led by e, E, d or D; 0 when no number leads the
 // text. Hexadecimal, infinity and NaN spellings are not numbers there.

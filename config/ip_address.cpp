@@ -1,48 +1,14 @@
 #include "config/ip_address.h"
 
+#include "base/c_runtime.h"
 #include "config/fixed_text.h"
 #include "config/save_config.h"
 
-#include <climits>
 #include <cstdio>
 #include <cstring>
 
 namespace config
 {
-namespace
-{
-
-bool IsSpace(char c)
-{
-    return c == ' ' || (c >= '\t' && c <= '\r');
-}
-
-bool IsDigit(char c)
-{
-    return c >= '0' && c <= '9';
-}
-
-} // namespace
-
-int ReadLeadingInteger(const char* text)
-{
-    while (IsSpace(*text))
-        ++text;
-    const bool negative = *text == '-';
-    if (*text == '-' || *text == '+')
-        ++text;
-    // Counted towards the negative end, which holds one more value.
-    long long value = 0;
-    for (; IsDigit(*text); ++text)
-    {
-        value = value * 10 - (*text - '0');
-        if (value < INT_MIN)
-            return negative ? INT_MIN : INT_MAX;
-    }
-    if (!negative)
-        return value < -INT_MAX ? INT_MAX : static_cast<int>(-value);
-    return static_cast<int>(value);
-}
 
 bool ReadOctet(const char* text, char (&octet)[4])
 {
@@ -54,7 +20,7 @@ bool ReadOctet(const char* text, char (&octet)[4])
         octet[0] = '*';
         return true;
     }
-    const int value = ReadLeadingInteger(text);
+    const int value = base::ReadLeadingInteger(text);
     if (value < 0 || value > 255)
         return false;
     std::snprintf(octet, sizeof octet, "%3.3d", value);
@@ -63,7 +29,7 @@ bool ReadOctet(const char* text, char (&octet)[4])
 
 int OctetValue(const char (&octet)[4])
 {
-    return ReadLeadingInteger(FieldText(octet).c_str());
+    return base::ReadLeadingInteger(FieldText(octet).c_str());
 }
 
 std::string ConnectLine(const IpEntry& entry)
@@ -83,7 +49,7 @@ std::string ListedLine(const IpEntry& entry)
 
 std::uint16_t ReadPort(const char* text)
 {
-    return static_cast<std::uint16_t>(static_cast<unsigned int>(ReadLeadingInteger(text)));
+    return static_cast<std::uint16_t>(static_cast<unsigned int>(base::ReadLeadingInteger(text)));
 }
 
 int FirstEmptyConnectSlot(const ConfigNetwork& network)

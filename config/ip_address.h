@@ -12,11 +12,6 @@
 namespace config
 {
 
-// What atoi reads (white space, a sign, the leading decimal digits; 0 when
-// there are none), saturated at the int range as the Windows runtime does, so
-// that an overlong number means the same on every platform.
-int ReadLeadingInteger(const char* text);
-
 // The text of one field of the IP entry dialog as a stored octet: "*" exactly
 // is any value; any other text is its leading integer, accepted within 0..255
 // and stored as three zero-padded digits, the rest of the octet zero. False

@@ -1,6 +1,7 @@
 #include "config/save_config.h"
 
 #include "base/atomic_file.h"
+#include "base/c_runtime.h"
 #include "base/cp932.h"
 #include "base/file_system.h"
 #include "config/fixed_text.h"
@@ -160,7 +161,7 @@ bool IsConnectSlotEmpty(const IpEntry& entry)
 {
     for (const char(&octet)[4] : entry.octets)
     {
-        if (std::atoi(FieldText(octet).c_str()) != 0)
+        if (base::ReadLeadingInteger(FieldText(octet).c_str()) != 0)
             return false;
     }
     return true;

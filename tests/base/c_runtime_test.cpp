@@ -1,5 +1,6 @@
 #include "base/c_runtime.h"
 
+#include <climits>
 #include <cmath>
 #include <gtest/gtest.h>
 #include <string>
@@ -29,4 +30,20 @@ TEST(CRuntime, NumbersReadAsTheWindowsAtofReadsThem)
     EXPECT_EQ(base::ReadDecimal("1e400"), HUGE_VAL);
     EXPECT_EQ(base::ReadDecimal(std::string(400, '9').c_str()), HUGE_VAL);
     EXPECT_EQ(base::ReadDecimal("-1e400"), -HUGE_VAL);
+}
+
+TEST(CRuntime, IntegersReadAsAtoiAndSaturateWhereGlibcWouldWrap)
+{
+    const std::pair<const char*, int> cases[] = {{"", 0},
+                                                 {"-", 0},
+                                                 {" \t+12x", 12},
+                                                 {"x12", 0},
+                                                 {"-0", 0},
+                                                 {"-2147483648", INT_MIN},
+                                                 {"2147483647", INT_MAX},
+                                                 {"2147483648", INT_MAX},
+                                                 {"99999999999999999999999", INT_MAX},
+                                                 {"-2147483649", INT_MIN}};
+    for (const auto& [text, value] : cases)
+        EXPECT_EQ(base::ReadLeadingInteger(text), value) << text;
 }
