@@ -3,7 +3,6 @@
 #include "config/ip_address.h"
 #include "config/volume.h"
 
-#include <climits>
 #include <cstring>
 #include <gtest/gtest.h>
 #include <string>
