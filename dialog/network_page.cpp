@@ -5,7 +5,7 @@
 #include "app/system.h"
 #include "config/fixed_text.h"
 #include "config/ip_address.h"
-#include "config/setting_names.h"
+#include "config/field_table.h"
 #include "dialog/page_controls.h"
 #include "resources/resource.h"
 
