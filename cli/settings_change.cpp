@@ -97,7 +97,8 @@ bool ChangeList(config::CSaveConfig& record, const config::FieldDescription& fie
             // stays where it was.
             config::ConfigNetwork& network = *record.Network();
             std::memset(network.connectList, 0, sizeof network.connectList);
-            std::memcpy(network.connectList, entries.data(), entries.size() * sizeof entries[0]);
+            for (std::size_t slot = 0; slot < entries.size(); ++slot)
+                network.connectList[slot] = entries[slot];
             return true;
         }
         for (std::size_t left = config::ReadList(record, kind).size(); left > 0; --left)

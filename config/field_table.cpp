@@ -667,8 +667,8 @@ std::string AllowedValues(const FieldDescription& field)
         return "0 to " + Decimal(kHighestController) +
                ", the controller's number in enumeration order";
     case FieldKind::KeyCode:
-        return "a key name such as UP, Z or DIK_1 (the digit keys need the prefix), or a key "
-               "code 1 to 255; never ESCAPE or F1 to F12";
+        return "a key name such as UP, Z or 2 (also DIK_UP), or a key code 1 to 255; never "
+               "ESCAPE or F1 to F12";
     case FieldKind::PadButton:
         return "a button name such as BUTTON3 or DP_UP, or a code 0 to " +
                Decimal(input::kPadFrameSize - 1);
@@ -688,12 +688,8 @@ std::string AllowedValues(const FieldDescription& field)
 
 bool ParseValue(const FieldAt& at, std::string_view text, std::int64_t* value)
 {
-    std::int64_t number = 0;
-    if (ReadInteger(text, &number))
-    {
-        *value = number;
-        return IsAllowed(*at.field, number);
-    }
+    // A meaning first: the key response "2" and the key 2 are what the
+    // pages show, where their stored numbers are not.
     for (const std::int64_t candidate : NamedValues(*at.field))
     {
         for (const std::string& form : MeaningForms(at, candidate))
@@ -701,11 +697,15 @@ bool ParseValue(const FieldAt& at, std::string_view text, std::int64_t* value)
             if (SameIgnoringCase(form, text))
             {
                 *value = candidate;
-                return IsAllowed(*at.field, candidate);
+                return true;
             }
         }
     }
-    return false;
+    std::int64_t number = 0;
+    if (!ReadInteger(text, &number))
+        return false;
+    *value = number;
+    return IsAllowed(*at.field, number);
 }
 
 std::vector<IpEntry> ReadList(const CSaveConfig& record, FieldKind kind)

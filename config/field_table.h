@@ -189,9 +189,10 @@ std::string TextMeaning(const FieldAt& at);
 bool IsAllowed(const FieldDescription& field, std::int64_t value);
 // The values the tool's controls allow, in words.
 std::string AllowedValues(const FieldDescription& field);
-// A value as a user writes it: the number, or what it means as ValueMeaning
-// gives it (ASCII letters in any case; for a resolution also with "x" for
-// "×"). False when the field does not allow it.
+// A value as a user writes it: what it means as ValueMeaning gives it
+// (ASCII letters in any case; for a resolution also with "x" for "×"; for a
+// key also with "DIK_" before its name), or else the stored number. False
+// when the field does not allow it.
 bool ParseValue(const FieldAt& at, std::string_view text, std::int64_t* value);
 
 // The address lists. An address reads as its four octets as stored

@@ -5,6 +5,8 @@
 #include "cli/encoding.h"
 #include "cli/platform.h"
 #include "cli/vekcfg.h"
+#include "config/fixed_text.h"
+#include "config/ip_address.h"
 #include "config/save_config.h"
 #include "tests/support/audio_fixtures.h"
 #include "tests/support/temp_folder.h"
@@ -151,6 +153,7 @@ TEST_F(Commands, CheckConfigChecksEveryRowWithMusicOneLineEach)
                   Utf8(u8"ClimaxTension 時間オーバー[現在 30.000000 秒です 18 秒以内にしてく"
                        u8"ださい] / Time Data IsCorrect Error!! / 変換エラー!!\n"));
     EXPECT_EQ(run.exitCode, 1);
+    EXPECT_EQ(Vekcfg({"check-config", "-j", "1", settings}).out, run.out) << "one at a time";
 }
 
 TEST_F(Commands, ShowPrintsEverySettingByNameWithItsMeaning)
@@ -213,6 +216,199 @@ TEST_F(Commands, UsageErrorsAndUnreadableFilesExitTwoWithTheReason)
         EXPECT_EQ(run.exitCode, 2) << reason;
         EXPECT_EQ(run.out, "") << reason;
         EXPECT_NE(run.err.find(reason), std::string::npos) << run.err;
+    }
+}
+
+config::IpEntry Address(const char* a, const char* b, const char* c, const char* d)
+{
+    config::IpEntry entry{};
+    const char* octets[] = {a, b, c, d};
+    for (int i = 0; i < 4; ++i)
+        EXPECT_TRUE(config::ReadOctet(octets[i], entry.octets[i]));
+    return entry;
+}
+
+// Every page changed, stored as the pages store it.
+config::CSaveConfig EveryPageChanged()
+{
+    config::CSaveConfig record;
+    record.ResetAll();
+    *record.Graphics() = {8, {}, 1, 0, 3, {}, 4};
+    config::ConfigGame& game = *record.Game();
+    game.screenShake = 0;
+    game.bgmVolume = -10000;
+    game.seVolume = -1250;
+    game.lockOnType = 3;
+    game.captureSize = 11;
+    config::ConfigNetwork& network = *record.Network();
+    network.port = 27015;
+    network.keyResponse = 4;
+    config::StoreFieldText(network.lobbyId, config::kIdTextLimit, "ロビー");
+    record.AddConnectEntry(Address("192", "168", "1", "*"));
+    // Listed when added, but its slot counts as free.
+    record.AddConnectEntry(Address("*", "*", "*", "*"));
+    record.AddAllowEntry(Address("10", "*", "0", "1"));
+    record.AddAllowEntry(Address("10", "*", "0", "2"));
+    record.AddDenyEntry(Address("255", "255", "255", "255"));
+    record.Replay()->saveReplays = 0;
+    record.Replay()->replayLock[29] = 1;
+    config::StoreFieldText(record.UserBgm()->rows[9].musicPath, config::kPathTextLimit,
+                           "C:\\音楽\\曲.ogg");
+    config::ConfigKeys& keys = *record.Keys();
+    std::swap(keys.keyboardKeys[14], keys.keyboardKeys[16]);
+    std::swap(keys.padConfigs[2].buttons[0], keys.padConfigs[2].buttons[14]);
+    keys.padConfigs[3].device = 0;
+    config::StoreFieldText(record.RadioChat()->entries[11].text, config::kRadioChatTextLimit,
+                           "援護を頼む");
+    record.RadioChat()->entries[11].notToAll = 1;
+    return record;
+}
+
+TEST_F(Commands, ApplyOfWhatShowPrintsMakesAFileTheToolWroteAgainByteForByte)
+{
+    config::CSaveConfig defaults;
+    defaults.ResetAll();
+    // Each is applied over the other, so that every value and list changes.
+    const config::CSaveConfig files[] = {defaults, EveryPageChanged()};
+    const std::string a = folder.File("a.dat"), b = folder.File("b.dat");
+    const std::string tree = folder.File("a.json");
+    for (int i = 0; i < 2; ++i)
+    {
+        ASSERT_TRUE(files[i].SaveToPath(a.c_str()));
+        ASSERT_TRUE(files[1 - i].SaveToPath(b.c_str()));
+        Write(tree, Vekcfg({"show", "--json", a}).out);
+        const ProgramRun applied = Vekcfg({"apply", b, tree});
+        EXPECT_EQ(applied.exitCode, 0) << applied.err;
+        EXPECT_EQ(ReadBytes(b), ReadBytes(a)) << i;
+    }
+}
+
+TEST_F(Commands, SetTakesANumberOrAMeaningAndShowReadsItBack)
+{
+    config::CSaveConfig record;
+    record.ResetAll();
+    ASSERT_TRUE(record.SaveToPath(settings.c_str()));
+    const ProgramRun set =
+        Vekcfg({"set", settings, "graphics.screenSize=1280x960", "game.seVolume=-12.50 dB",
+                "graphics.fullScreen=on", "keys.keyboardKeys[4]=Z", "keys.keyboardKeys[14]=up",
+                "keys.padConfigs[1].buttons[14]=BUTTON3", "keys.padConfigs[1].buttons[16]=14",
+                "radioChat.entries[1].notToAll=not to everyone", "network.keyResponse=2",
+                "network.connectList+=192.168.1.*", "network.allowList+=10.0.0.1",
+                "network.allowList+=10.0.0.2", "network.allowList-=010.0.0.1",
+                "userBgm.rows[0].musicPath=a.ogg"});
+    EXPECT_EQ(set.exitCode, 0) << set.err;
+    EXPECT_EQ(set.out + set.err, "");
+    const std::string out = Vekcfg({"show", settings}).out;
+    for (const char8_t* line : {
+             u8"graphics.screenSize = 3 (1280×960)\n",
+             u8"game.seVolume = -1250 (-12.50 dB)\n",
+             u8"graphics.fullScreen = 1 (on)\n",
+             u8"keys.keyboardKeys[4] = 44 (移動上: Z)\n",
+             u8"keys.keyboardKeys[14] = 200 (スライド/決定: UP)\n",
+             u8"keys.padConfigs[1].buttons[14] = 16 (スライド/決定: BUTTON3)\n",
+             u8"keys.padConfigs[1].buttons[16] = 14 (射撃: BUTTON1)\n",
+             u8"radioChat.entries[1].notToAll = 1 (F2: not to everyone (全体 cleared))\n",
+             u8"network.keyResponse = 1 (2)\n",
+             u8"network.connectList[0] = \"192.168.001.*\" (192.168.1.0)\n",
+             u8"network.allowList[0] = \"010.000.000.002\"\n",
+             u8"userBgm.rows[0].musicPath = \"a.ogg\"\n",
+         })
+        EXPECT_NE(out.find(Utf8(line)), std::string::npos) << Utf8(line);
+}
+
+TEST_F(Commands, EveryRefusalExitsTwoNamingTheSettingAndWritesNothing)
+{
+    config::CSaveConfig full;
+    full.ResetAll();
+    for (int slot = 0; slot < config::kConnectSlotCount; ++slot)
+        full.AddConnectEntry(Address("10", "0", "0", std::to_string(slot + 1).c_str()));
+    ASSERT_TRUE(full.SaveToPath(settings.c_str()));
+    std::vector<std::uint8_t> newer = ReadBytes(settings);
+    newer[0] = 0x01;
+    testing_support::WriteBytes(folder.File("newer.dat"), newer);
+    std::filesystem::create_directory(folder.File("folder.dat"));
+    const std::string emoji = folder.File("emoji.json"), broken = folder.File("broken.json");
+    const std::string unknown = folder.File("unknown.json");
+    Write(emoji, "{\"network\": {\"lobbyId\": \"\\ud83d\\ude00\"}}");
+    Write(broken, "{\"graphics\": {\"screenSize\": 3,}}");
+    Write(unknown, "{\"graphics\": {\"screenSize\": 3, \"size\": 1}}");
+
+    const std::pair<std::vector<std::string>, std::string> rows[] = {
+        {{"set", settings, "graphics.size=1"}, "graphics.size"},
+        {{"set", settings, "keys.keyboardKeys[24]=Z"}, "keys.keyboardKeys[24]"},
+        {{"set", settings, "graphics.screenSize=12"}, "graphics.screenSize: "},
+        {{"set", settings, "graphics.hdrLevel=LEVEL9"}, "graphics.hdrLevel: "},
+        {{"set", settings, "keys.keyboardKeys[4]=F1"}, "keys.keyboardKeys[4]: "},
+        {{"set", settings, "keys.keyboardKeys[4]=X"}, "keys.keyboardKeys[16]"},
+        {{"set", settings, "radioChat.entries[0].text=" + std::string(38, 'r')},
+         "radioChat.entries[0].text: "},
+        {{"set", settings, "network.connectList+=10.0.0.99"}, "network.connectList: "},
+        {{"set", settings, "network.denyList-=1.2.3.4"}, "network.denyList: "},
+        {{"set", settings, "network.allowList+=1.2.3.256"}, "network.allowList: "},
+        {{"set", settings, "graphics.showMovie=on", "game.bgmVolume=-3000"}, "game.bgmVolume: "},
+        {{"apply", settings, emoji}, "network.lobbyId: "},
+        {{"apply", settings, broken}, "line 1, column 31"},
+        {{"apply", settings, unknown}, "graphics.size"},
+        {{"set", folder.File("newer.dat"), "graphics.screenSize=1"}, "newer.dat"},
+        {{"set", missing, "graphics.screenSize=1"}, "missing.wav"},
+        {{"set", folder.File("folder.dat"), "graphics.screenSize=1"}, "folder.dat"},
+    };
+    const std::vector<std::uint8_t> before = ReadBytes(settings);
+    for (const auto& [arguments, named] : rows)
+    {
+        const ProgramRun run = Vekcfg(arguments);
+        EXPECT_EQ(run.exitCode, 2) << named;
+        EXPECT_EQ(run.err.rfind("vekcfg: ", 0), 0u) << run.err;
+        EXPECT_NE(run.err.find(named), std::string::npos) << run.err;
+        EXPECT_EQ(ReadBytes(settings), before) << named;
+    }
+    EXPECT_EQ(ReadBytes(folder.File("newer.dat")), newer);
+    EXPECT_FALSE(std::filesystem::exists(missing));
+}
+
+TEST_F(Commands, AFailedSaveExitsOneAndLeavesTheOldFile)
+{
+    config::CSaveConfig record;
+    record.ResetAll();
+    ASSERT_TRUE(record.SaveToPath(settings.c_str()));
+    const std::vector<std::uint8_t> before = ReadBytes(settings);
+    // A folder where the save puts its temporary file.
+    std::filesystem::create_directories(folder.File("GameConfig.new") + "/inside");
+    const ProgramRun run = Vekcfg({"set", settings, "graphics.screenSize=0"});
+    EXPECT_EQ(run.exitCode, 1);
+    EXPECT_NE(run.err.find(settings), std::string::npos) << run.err;
+    EXPECT_EQ(ReadBytes(settings), before);
+}
+
+TEST_F(Commands, EveryDraftPassesTheCheckAndMusicItCannotUseGetsItsMessage)
+{
+    const std::string draft = folder.File("draft.txt");
+    for (const double seconds : {60.0, 60.001, 99.9, 183.37, 240.0, 479.999, 480.0})
+    {
+        testing_support::WriteBytes(music, testing_support::MakeWaveOfLength(seconds));
+        EXPECT_EQ(Vekcfg({"draft", music, draft}).exitCode, 0) << seconds;
+        const ProgramRun checked = Vekcfg({"check", music, draft});
+        EXPECT_EQ(checked.out, kAccepted) << seconds;
+    }
+    // Without OUT the same text goes to standard output.
+    const std::vector<std::uint8_t> drafted = ReadBytes(draft);
+    EXPECT_EQ(Vekcfg({"draft", music}).out, std::string(drafted.begin(), drafted.end()));
+    std::filesystem::remove(draft);
+
+    const std::string shorter = folder.File("short.wav"), longer = folder.File("long.wav");
+    testing_support::WriteBytes(shorter, testing_support::MakeWaveOfLength(59.999));
+    testing_support::WriteBytes(longer, testing_support::MakeWaveOfLength(480.001));
+    const std::pair<std::string, std::string> rows[] = {
+        {shorter, Utf8(u8"60秒以上の長さのファイルが必要です]\n")},
+        {longer, Utf8(u8"480秒以下の長さのファイルが必要です]\n")},
+        {missing, kNoMusic},
+    };
+    for (const auto& [unusable, message] : rows)
+    {
+        const ProgramRun run = Vekcfg({"draft", unusable, draft});
+        EXPECT_EQ(run.exitCode, 1) << unusable;
+        EXPECT_NE(run.err.find(message), std::string::npos) << run.err;
+        EXPECT_FALSE(std::filesystem::exists(draft)) << unusable;
     }
 }
 

@@ -1,0 +1,110 @@
+// The description of the record's fields: every value the controls allow
+// can be given by what it means, and what they cannot store is refused.
+#include "config/field_table.h"
+
+#include <gtest/gtest.h>
+#include <string>
+
+namespace
+{
+
+config::FieldAt At(const std::string& name)
+{
+    config::FieldAt at;
+    std::string reason;
+    EXPECT_TRUE(config::FindField(name, &at, &reason)) << reason;
+    return at;
+}
+
+TEST(FieldTable, EveryAllowedValueIsReadBackFromItsNumberAndFromWhatItMeans)
+{
+    for (const config::FieldDescription& field : config::Fields())
+    {
+        if (!config::IsNumberKind(field.kind))
+            continue;
+        const config::FieldAt at{&field, {field.counts[0] - 1 > 0 ? 1 : 0, 0}};
+        // A sample of the longer ranges: each value's meaning is weighed
+        // against every other's.
+        const bool volume = field.kind == config::FieldKind::Volume;
+        const std::int64_t step = volume ? 250 : field.options.empty() ? 7 : 1;
+        for (std::int64_t value = volume ? -10000 : 0; value <= 256; value += step)
+        {
+            if (!config::IsAllowed(field, value))
+                continue;
+            // A number is the stored number unless it is what another value
+            // means (the key response "2", the key 2).
+            std::int64_t read = -1;
+            EXPECT_TRUE(config::ParseValue(at, std::to_string(value), &read)) << field.name;
+            if (read != value)
+            {
+                const std::string meaning = config::ValueMeaning(at, read);
+                EXPECT_TRUE(meaning.ends_with(": " + std::to_string(value)) ||
+                            meaning == std::to_string(value))
+                    << field.name << " " << value;
+            }
+            const std::string meaning = config::ValueMeaning(at, value);
+            if (meaning.empty() || meaning.find("(no name)") != std::string::npos)
+                continue;
+            read = -1;
+            EXPECT_TRUE(config::ParseValue(at, meaning, &read)) << meaning;
+            EXPECT_EQ(read, value) << meaning;
+        }
+    }
+}
+
+TEST(FieldTable, WhatTheControlsCannotStoreIsRefused)
+{
+    const struct
+    {
+        const char* name;
+        std::string value;
+    } values[] = {
+        {"graphics.screenSize", "12"},
+        {"graphics.screenSize", "1280x961"},
+        {"game.bgmVolume", "-3000"},
+        {"network.port", "65536"},
+        {"keys.keyboardKeys[3]", "ESCAPE"},
+        {"keys.keyboardKeys[3]", "1000"},
+        {"keys.padConfigs[0].buttons[0]", "48"},
+        {"replay.replayLock[0]", "2"},
+    };
+    for (const auto& v : values)
+    {
+        std::int64_t read = 0;
+        EXPECT_FALSE(config::ParseValue(At(v.name), v.value, &read)) << v.name << "=" << v.value;
+    }
+
+    config::FieldAt at;
+    std::string reason;
+    for (const char* name :
+         {"graphics", "graphics.size", "keys.keyboardKeys", "keys.keyboardKeys[24]",
+          "keys.padConfigs[4].device", "keys.keyboardKeys[-1]"})
+        EXPECT_FALSE(config::FindField(name, &at, &reason)) << name;
+    EXPECT_FALSE(config::FitsText(*At("radioChat.entries[0].text").field, std::string(38, 'r')));
+}
+
+TEST(FieldTable, AnAddressFollowsTheOctetRulesOfTheEntryDialog)
+{
+    const struct
+    {
+        std::string text;
+        bool read;
+        std::string stored;
+    } cases[] = {
+        {"192.168.1.*", true, "192.168.001.*"},
+        {"0.0.0.0", true, "000.000.000.000"},
+        {"1.2.3", false, ""},
+        {"1.2.3.4.5", false, ""},
+        {"1234.1.1.1", false, ""},
+        {"1..1.1", false, ""},
+        {"", false, ""},
+    };
+    for (const auto& c : cases)
+    {
+        config::IpEntry entry{};
+        EXPECT_EQ(config::ParseAddress(c.text, false, &entry), c.read) << c.text;
+        EXPECT_EQ(config::AddressText(entry), c.stored) << c.text;
+    }
+}
+
+} // namespace
