@@ -194,13 +194,14 @@ bool CheckCodesStayApart(const config::CSaveConfig& record,
             if (other.index[last] == at.index[last] ||
                 config::ReadNumber(record, other) != config::ReadNumber(record, at))
                 continue;
-            const std::string meaning =
-                Utf8FromCp932(config::ValueMeaning(other, config::ReadNumber(record, other)));
-            *refusal = config::FieldName(at) + ": " +
-                       std::to_string(config::ReadNumber(record, at)) + " stays on " +
-                       config::FieldName(other) + " (" + meaning +
-                       "), and the key pages never give one code to two actions; give that one "
-                       "a new code as well to exchange them" +
+            const std::int64_t code = config::ReadNumber(record, at);
+            *refusal = config::FieldName(at) + " (" +
+                       Utf8FromCp932(config::ValueMeaning(at, code)) + ") and " +
+                       config::FieldName(other) + " (" +
+                       Utf8FromCp932(config::ValueMeaning(other, code)) +
+                       ") would have the same code, " + std::to_string(code) +
+                       "; the key pages never give one code to two actions: give the other a "
+                       "new code as well to exchange them" +
                        Allowed(*at.field);
             return false;
         }

@@ -49,11 +49,11 @@ std::string Trimmed(std::string text)
 }
 
 // Tenths of a second, rounded down: an entry never moves later than its
-// share.
+// share (but 0.7 of 180 s, which doubles hold as 125.99999..., is 126).
 std::string Seconds(double seconds)
 {
     char text[32];
-    std::snprintf(text, sizeof text, "%.1f", std::floor(seconds * 10.0) / 10.0);
+    std::snprintf(text, sizeof text, "%.1f", std::floor(seconds * 10.0 + 1e-6) / 10.0);
     return text;
 }
 

@@ -220,8 +220,9 @@ int Apply(const Invocation& invocation)
     const int readError = errno;
     if (file != nullptr && !standardInput)
         std::fclose(file);
-    const std::string shown = standardInput ? std::string("standard input")
-                                            : "\"" + Utf8FromNative(invocation.jsonPath) + "\"";
+    const std::string shown = standardInput
+                                  ? std::string("standard input")
+                                  : std::string("\"") + Utf8FromNative(invocation.jsonPath) + "\"";
     if (!read)
     {
         Complain("cannot read the settings tree " + shown + ": " +

@@ -200,11 +200,11 @@ std::string Label(const FieldAt& at)
     case FieldLabel::Action:
         return kActionLabels[index];
     case FieldLabel::Replay:
-        return "リプレイ" + Decimal(index + 1);
+        return std::string("リプレイ") + Decimal(index + 1);
     case FieldLabel::Player:
         return Decimal(index + 1) + "P";
     case FieldLabel::FunctionKey:
-        return "F" + Decimal(index + 1);
+        return std::string("F") + Decimal(index + 1);
     }
     return std::string();
 }
@@ -271,13 +271,24 @@ std::vector<std::string> MeaningForms(const FieldAt& at, std::int64_t value)
     if (note != std::string::npos && note > 0)
         forms.push_back(rest.substr(0, note));
     if (at.field->kind == FieldKind::KeyCode)
-        forms.push_back("DIK_" + rest);
+        forms.push_back(std::string("DIK_") + rest);
     if (at.field->kind == FieldKind::Choice)
     {
         // "1280×960" may be written "1280x960".
-        std::string plain = meaning;
-        for (std::size_t sign; (sign = plain.find("×")) != std::string::npos;)
-            plain.replace(sign, std::strlen("×"), "x");
+        const std::string_view sign = "×";
+        std::string plain;
+        for (std::size_t i = 0; i < meaning.size();)
+        {
+            if (meaning.compare(i, sign.size(), sign) == 0)
+            {
+                plain += 'x';
+                i += sign.size();
+            }
+            else
+            {
+                plain += meaning[i++];
+            }
+        }
         forms.push_back(plain);
     }
     return forms;
@@ -494,7 +505,7 @@ std::string FieldName(const FieldAt& at)
     {
         if (c[0] == '[' && c[1] == ']')
         {
-            name += "[" + Decimal(at.index[dimension++]) + "]";
+            name += std::string("[") + Decimal(at.index[dimension++]) + "]";
             ++c;
         }
         else
