@@ -1,5 +1,6 @@
 // vekcfg.exe changes the tool's own file, found from TEMP as the tool finds
-// it; the values read back through vekcfg show and on the tool's pages.
+// it; the values read back through vekcfg show, through apply from standard
+// input, and on the tool's pages.
 #include "config/save_config.h"
 #include "resources/resource.h"
 #include "tests/e2e/tool_driver.h"
@@ -11,8 +12,10 @@ namespace
 {
 
 // Runs vekcfg.exe, which lies beside this test, to its end with the test's
-// environment; its standard output goes to `output`.
-DWORD RunVekcfg(const std::string& arguments, const std::string& output)
+// environment; its standard output goes to `output`, and it reads `input`
+// (a file) when one is given.
+DWORD RunVekcfg(const std::string& arguments, const std::string& output,
+                const std::string& input = std::string())
 {
     char self[MAX_PATH] = {};
     GetModuleFileNameA(nullptr, self, sizeof self);
@@ -21,10 +24,14 @@ DWORD RunVekcfg(const std::string& arguments, const std::string& output)
     SECURITY_ATTRIBUTES inheritable{sizeof inheritable, nullptr, TRUE};
     HANDLE out = CreateFileA(output.c_str(), GENERIC_WRITE, FILE_SHARE_READ, &inheritable,
                              CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
+    HANDLE in = input.empty()
+                    ? INVALID_HANDLE_VALUE
+                    : CreateFileA(input.c_str(), GENERIC_READ, FILE_SHARE_READ, &inheritable,
+                                  OPEN_EXISTING, FILE_ATTRIBUTE_NORMAL, nullptr);
     STARTUPINFOA startup{};
     startup.cb = sizeof startup;
     startup.dwFlags = STARTF_USESTDHANDLES;
-    startup.hStdInput = INVALID_HANDLE_VALUE;
+    startup.hStdInput = in;
     startup.hStdOutput = out;
     startup.hStdError = out;
     PROCESS_INFORMATION process{};
@@ -38,6 +45,8 @@ DWORD RunVekcfg(const std::string& arguments, const std::string& output)
         CloseHandle(process.hProcess);
     }
     CloseHandle(out);
+    if (in != INVALID_HANDLE_VALUE)
+        CloseHandle(in);
     return exitCode;
 }
 
@@ -63,6 +72,13 @@ TEST(Vekcfg, AValueSetOnTheCommandLineReadsBackThroughShowAndOnThePages)
     for (const char* line : {"graphics.screenSize = 3 (1280", "keys.keyboardKeys[4] = 44 (",
                              "radioChat.entries[2].text = \"roger\" (F3)"})
         EXPECT_NE(text.find(line), std::string::npos) << line;
+
+    // The tree show prints, in the console's code page, brings the values
+    // back through standard input into a file of defaults.
+    const std::string tree = folder.Root().File("tree.json");
+    ASSERT_EQ(RunVekcfg("show --json", tree), 0u);
+    testing_support::WriteBytes(folder.SettingsFile(), record.SaveToBytes());
+    ASSERT_EQ(RunVekcfg("apply -", output, tree), 0u);
 
     e2e::ToolProcess tool;
     const HWND dialog = tool.MainDialog();
