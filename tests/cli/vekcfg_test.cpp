@@ -4,9 +4,8 @@
 #include "cli/command_line.h"
 #include "cli/encoding.h"
 #include "cli/platform.h"
+#include "cli/tension_draft.h"
 #include "cli/vekcfg.h"
-#include "config/fixed_text.h"
-#include "config/ip_address.h"
 #include "config/save_config.h"
 #include "tests/support/audio_fixtures.h"
 #include "tests/support/temp_folder.h"
@@ -153,7 +152,8 @@ TEST_F(Commands, CheckConfigChecksEveryRowWithMusicOneLineEach)
                   Utf8(u8"ClimaxTension 時間オーバー[現在 30.000000 秒です 18 秒以内にしてく"
                        u8"ださい] / Time Data IsCorrect Error!! / 変換エラー!!\n"));
     EXPECT_EQ(run.exitCode, 1);
-    EXPECT_EQ(Vekcfg({"check-config", "-j", "1", settings}).out, run.out) << "one at a time";
+    for (const char* jobs : {"1", "4"})
+        EXPECT_EQ(Vekcfg({"check-config", "-j", jobs, settings}).out, run.out) << jobs;
 }
 
 TEST_F(Commands, ShowPrintsEverySettingByNameWithItsMeaning)
@@ -219,68 +219,19 @@ TEST_F(Commands, UsageErrorsAndUnreadableFilesExitTwoWithTheReason)
     }
 }
 
-config::IpEntry Address(const char* a, const char* b, const char* c, const char* d)
+// Every page changed, each setting by its number or by what it means.
+std::vector<std::string> ChangeEveryPage(const std::string& file)
 {
-    config::IpEntry entry{};
-    const char* octets[] = {a, b, c, d};
-    for (int i = 0; i < 4; ++i)
-        EXPECT_TRUE(config::ReadOctet(octets[i], entry.octets[i]));
-    return entry;
-}
-
-// Every page changed, stored as the pages store it.
-config::CSaveConfig EveryPageChanged()
-{
-    config::CSaveConfig record;
-    record.ResetAll();
-    *record.Graphics() = {8, {}, 1, 0, 3, {}, 4};
-    config::ConfigGame& game = *record.Game();
-    game.screenShake = 0;
-    game.bgmVolume = -10000;
-    game.seVolume = -1250;
-    game.lockOnType = 3;
-    game.captureSize = 11;
-    config::ConfigNetwork& network = *record.Network();
-    network.port = 27015;
-    network.keyResponse = 4;
-    config::StoreFieldText(network.lobbyId, config::kIdTextLimit, "ロビー");
-    record.AddConnectEntry(Address("192", "168", "1", "*"));
-    // Listed when added, but its slot counts as free.
-    record.AddConnectEntry(Address("*", "*", "*", "*"));
-    record.AddAllowEntry(Address("10", "*", "0", "1"));
-    record.AddAllowEntry(Address("10", "*", "0", "2"));
-    record.AddDenyEntry(Address("255", "255", "255", "255"));
-    record.Replay()->saveReplays = 0;
-    record.Replay()->replayLock[29] = 1;
-    config::StoreFieldText(record.UserBgm()->rows[9].musicPath, config::kPathTextLimit,
-                           "C:\\音楽\\曲.ogg");
-    config::ConfigKeys& keys = *record.Keys();
-    std::swap(keys.keyboardKeys[14], keys.keyboardKeys[16]);
-    std::swap(keys.padConfigs[2].buttons[0], keys.padConfigs[2].buttons[14]);
-    keys.padConfigs[3].device = 0;
-    config::StoreFieldText(record.RadioChat()->entries[11].text, config::kRadioChatTextLimit,
-                           "援護を頼む");
-    record.RadioChat()->entries[11].notToAll = 1;
-    return record;
-}
-
-TEST_F(Commands, ApplyOfWhatShowPrintsMakesAFileTheToolWroteAgainByteForByte)
-{
-    config::CSaveConfig defaults;
-    defaults.ResetAll();
-    // Each is applied over the other, so that every value and list changes.
-    const config::CSaveConfig files[] = {defaults, EveryPageChanged()};
-    const std::string a = folder.File("a.dat"), b = folder.File("b.dat");
-    const std::string tree = folder.File("a.json");
-    for (int i = 0; i < 2; ++i)
-    {
-        ASSERT_TRUE(files[i].SaveToPath(a.c_str()));
-        ASSERT_TRUE(files[1 - i].SaveToPath(b.c_str()));
-        Write(tree, Vekcfg({"show", "--json", a}).out);
-        const ProgramRun applied = Vekcfg({"apply", b, tree});
-        EXPECT_EQ(applied.exitCode, 0) << applied.err;
-        EXPECT_EQ(ReadBytes(b), ReadBytes(a)) << i;
-    }
+    return {"set", file, "graphics.screenSize=1280x960", "graphics.fullScreen=on",
+            "game.seVolume=-12.50 dB", "keys.keyboardKeys[4]=Z", "keys.keyboardKeys[14]=up",
+            "keys.padConfigs[1].buttons[14]=BUTTON3", "keys.padConfigs[1].buttons[16]=14",
+            "keys.padConfigs[3].device=0", "radioChat.entries[1].notToAll=not to everyone",
+            "radioChat.entries[11].text=" + Utf8(u8"援護を頼む"), "network.keyResponse=2",
+            "network.lobbyId=" + Utf8(u8"ロビー"), "network.connectList+=192.168.1.*",
+            // Listed when added, but its slot counts as free.
+            "network.connectList+=*.*.*.*", "network.allowList+=10.0.0.1",
+            "network.allowList+=10.0.0.2", "network.allowList-=010.0.0.1",
+            "replay.replayLock[29]=1", "userBgm.rows[9].musicPath=" + Utf8(u8"C:\\音楽\\曲.ogg")};
 }
 
 TEST_F(Commands, SetTakesANumberOrAMeaningAndShowReadsItBack)
@@ -288,21 +239,13 @@ TEST_F(Commands, SetTakesANumberOrAMeaningAndShowReadsItBack)
     config::CSaveConfig record;
     record.ResetAll();
     ASSERT_TRUE(record.SaveToPath(settings.c_str()));
-    const ProgramRun set =
-        Vekcfg({"set", settings, "graphics.screenSize=1280x960", "game.seVolume=-12.50 dB",
-                "graphics.fullScreen=on", "keys.keyboardKeys[4]=Z", "keys.keyboardKeys[14]=up",
-                "keys.padConfigs[1].buttons[14]=BUTTON3", "keys.padConfigs[1].buttons[16]=14",
-                "radioChat.entries[1].notToAll=not to everyone", "network.keyResponse=2",
-                "network.connectList+=192.168.1.*", "network.allowList+=10.0.0.1",
-                "network.allowList+=10.0.0.2", "network.allowList-=010.0.0.1",
-                "userBgm.rows[0].musicPath=a.ogg"});
+    const ProgramRun set = Vekcfg(ChangeEveryPage(settings));
     EXPECT_EQ(set.exitCode, 0) << set.err;
     EXPECT_EQ(set.out + set.err, "");
     const std::string out = Vekcfg({"show", settings}).out;
     for (const char8_t* line : {
              u8"graphics.screenSize = 3 (1280×960)\n",
              u8"game.seVolume = -1250 (-12.50 dB)\n",
-             u8"graphics.fullScreen = 1 (on)\n",
              u8"keys.keyboardKeys[4] = 44 (移動上: Z)\n",
              u8"keys.keyboardKeys[14] = 200 (スライド/決定: UP)\n",
              u8"keys.padConfigs[1].buttons[14] = 16 (スライド/決定: BUTTON3)\n",
@@ -311,75 +254,85 @@ TEST_F(Commands, SetTakesANumberOrAMeaningAndShowReadsItBack)
              u8"network.keyResponse = 1 (2)\n",
              u8"network.connectList[0] = \"192.168.001.*\" (192.168.1.0)\n",
              u8"network.allowList[0] = \"010.000.000.002\"\n",
-             u8"userBgm.rows[0].musicPath = \"a.ogg\"\n",
+             u8"userBgm.rows[9].musicPath = \"C:\\音楽\\曲.ogg\"\n",
          })
         EXPECT_NE(out.find(Utf8(line)), std::string::npos) << Utf8(line);
 }
 
-TEST_F(Commands, EveryRefusalExitsTwoNamingTheSettingAndWritesNothing)
+TEST_F(Commands, ApplyOfWhatShowPrintsMakesAFileTheToolWroteAgainByteForByte)
 {
-    config::CSaveConfig full;
-    full.ResetAll();
-    for (int slot = 0; slot < config::kConnectSlotCount; ++slot)
-        full.AddConnectEntry(Address("10", "0", "0", std::to_string(slot + 1).c_str()));
-    ASSERT_TRUE(full.SaveToPath(settings.c_str()));
-    std::vector<std::uint8_t> newer = ReadBytes(settings);
-    newer[0] = 0x01;
-    testing_support::WriteBytes(folder.File("newer.dat"), newer);
-    std::filesystem::create_directory(folder.File("folder.dat"));
-    const std::string emoji = folder.File("emoji.json"), broken = folder.File("broken.json");
-    const std::string unknown = folder.File("unknown.json");
-    Write(emoji, "{\"network\": {\"lobbyId\": \"\\ud83d\\ude00\"}}");
-    Write(broken, "{\"graphics\": {\"screenSize\": 3,}}");
-    Write(unknown, "{\"graphics\": {\"screenSize\": 3, \"size\": 1}}");
-
-    const std::pair<std::vector<std::string>, std::string> rows[] = {
-        {{"set", settings, "graphics.size=1"}, "graphics.size"},
-        {{"set", settings, "keys.keyboardKeys[24]=Z"}, "keys.keyboardKeys[24]"},
-        {{"set", settings, "graphics.screenSize=12"}, "graphics.screenSize: "},
-        {{"set", settings, "graphics.hdrLevel=LEVEL9"}, "graphics.hdrLevel: "},
-        {{"set", settings, "keys.keyboardKeys[4]=F1"}, "keys.keyboardKeys[4]: "},
-        {{"set", settings, "keys.keyboardKeys[4]=X"}, "keys.keyboardKeys[16]"},
-        {{"set", settings, "radioChat.entries[0].text=" + std::string(38, 'r')},
-         "radioChat.entries[0].text: "},
-        {{"set", settings, "network.connectList+=10.0.0.99"}, "network.connectList: "},
-        {{"set", settings, "network.denyList-=1.2.3.4"}, "network.denyList: "},
-        {{"set", settings, "network.allowList+=1.2.3.256"}, "network.allowList: "},
-        {{"set", settings, "graphics.showMovie=on", "game.bgmVolume=-3000"}, "game.bgmVolume: "},
-        {{"apply", settings, emoji}, "network.lobbyId: "},
-        {{"apply", settings, broken}, "line 1, column 31"},
-        {{"apply", settings, unknown}, "graphics.size"},
-        {{"set", folder.File("newer.dat"), "graphics.screenSize=1"}, "newer.dat"},
-        {{"set", missing, "graphics.screenSize=1"}, "missing.wav"},
-        {{"set", folder.File("folder.dat"), "graphics.screenSize=1"}, "folder.dat"},
-    };
-    const std::vector<std::uint8_t> before = ReadBytes(settings);
-    for (const auto& [arguments, named] : rows)
+    const std::string defaults = folder.File("defaults.dat"), changed = folder.File("changed.dat");
+    config::CSaveConfig record;
+    record.ResetAll();
+    ASSERT_TRUE(record.SaveToPath(defaults.c_str()));
+    ASSERT_TRUE(record.SaveToPath(changed.c_str()));
+    ASSERT_EQ(Vekcfg(ChangeEveryPage(changed)).exitCode, 0);
+    // Each is applied over the other, so that every value and list changes.
+    const std::string tree = folder.File("tree.json"), target = folder.File("target.dat");
+    for (const auto& [from, over] : {std::pair{defaults, changed}, std::pair{changed, defaults}})
     {
-        const ProgramRun run = Vekcfg(arguments);
-        EXPECT_EQ(run.exitCode, 2) << named;
-        EXPECT_EQ(run.err.rfind("vekcfg: ", 0), 0u) << run.err;
-        EXPECT_NE(run.err.find(named), std::string::npos) << run.err;
-        EXPECT_EQ(ReadBytes(settings), before) << named;
+        std::filesystem::copy_file(over, target, std::filesystem::copy_options::overwrite_existing);
+        Write(tree, Vekcfg({"show", "--json", from}).out);
+        const ProgramRun applied = Vekcfg({"apply", target, tree});
+        EXPECT_EQ(applied.exitCode, 0) << applied.err;
+        EXPECT_EQ(ReadBytes(target), ReadBytes(from)) << from;
     }
-    EXPECT_EQ(ReadBytes(folder.File("newer.dat")), newer);
-    EXPECT_FALSE(std::filesystem::exists(missing));
 }
 
-TEST_F(Commands, AFailedSaveExitsOneAndLeavesTheOldFile)
+TEST_F(Commands, EveryKindOfRefusalExitsTwoNamingTheSettingAndLeavesTheFile)
 {
     config::CSaveConfig record;
     record.ResetAll();
     ASSERT_TRUE(record.SaveToPath(settings.c_str()));
-    const std::vector<std::uint8_t> before = ReadBytes(settings);
-    // A folder where the save puts its temporary file.
-    std::filesystem::create_directories(folder.File("GameConfig.new") + "/inside");
-    const ProgramRun run = Vekcfg({"set", settings, "graphics.screenSize=0"});
-    EXPECT_EQ(run.exitCode, 1);
-    EXPECT_NE(run.err.find(settings), std::string::npos) << run.err;
-    EXPECT_EQ(ReadBytes(settings), before);
+    std::vector<std::uint8_t> newer = ReadBytes(settings);
+    newer[0] = 0x01;
+    testing_support::WriteBytes(folder.File("newer.dat"), newer);
+    std::filesystem::create_directory(folder.File("folder.dat"));
+    Write(folder.File("broken.json"), "{\"graphics\": {\"screenSize\": 3,}}");
+    std::vector<std::string> overFull{"set", settings};
+    for (int slot = 0; slot <= config::kConnectSlotCount; ++slot)
+        overFull.push_back("network.connectList+=10.0.0." + std::to_string(slot + 1));
+
+    const struct
+    {
+        const char* kind;
+        std::vector<std::string> arguments;
+        std::string named;
+    } rows[] = {
+        {"unknown name", {"set", settings, "graphics.size=1"}, "graphics.size"},
+        {"out of range", {"set", settings, "graphics.screenSize=12"}, "graphics.screenSize: "},
+        {"newer version", {"set", folder.File("newer.dat"), "graphics.screenSize=1"}, "newer.dat"},
+        {"missing file", {"set", missing, "graphics.screenSize=1"}, missing},
+        {"unreadable file",
+         {"set", folder.File("folder.dat"), "graphics.screenSize=1"},
+         "folder.dat"},
+        {"not in code page 932",
+         {"set", settings, "network.lobbyId=\xF0\x9F\x98\x80"},
+         "network.lobbyId: "},
+        {"text too long",
+         {"set", settings, "radioChat.entries[0].text=" + std::string(38, 'r')},
+         "radioChat.entries[0].text: "},
+        {"list over 24", overFull, "network.connectList: "},
+        {"bad JSON", {"apply", settings, folder.File("broken.json")}, "line 1, column 31"},
+    };
+    const auto contents = [](const std::string& file) {
+        return std::filesystem::is_regular_file(file) ? ReadBytes(file)
+                                                      : std::vector<std::uint8_t>();
+    };
+    for (const auto& row : rows)
+    {
+        const std::string& file = row.arguments[1];
+        const std::vector<std::uint8_t> before = contents(file);
+        const ProgramRun run = Vekcfg(row.arguments);
+        EXPECT_EQ(run.exitCode, 2) << row.kind;
+        EXPECT_EQ(run.err.rfind("vekcfg: ", 0), 0u) << run.err;
+        EXPECT_NE(run.err.find(row.named), std::string::npos) << row.kind << ": " << run.err;
+        EXPECT_EQ(contents(file), before) << row.kind;
+    }
+    EXPECT_FALSE(std::filesystem::exists(missing));
 }
 
+// Across the accepted range of music lengths, and the music it cannot use.
 TEST_F(Commands, EveryDraftPassesTheCheckAndMusicItCannotUseGetsItsMessage)
 {
     const std::string draft = folder.File("draft.txt");
@@ -387,8 +340,7 @@ TEST_F(Commands, EveryDraftPassesTheCheckAndMusicItCannotUseGetsItsMessage)
     {
         testing_support::WriteBytes(music, testing_support::MakeWaveOfLength(seconds));
         EXPECT_EQ(Vekcfg({"draft", music, draft}).exitCode, 0) << seconds;
-        const ProgramRun checked = Vekcfg({"check", music, draft});
-        EXPECT_EQ(checked.out, kAccepted) << seconds;
+        EXPECT_EQ(Vekcfg({"check", music, draft}).out, kAccepted) << seconds;
     }
     // Without OUT the same text goes to standard output.
     const std::vector<std::uint8_t> drafted = ReadBytes(draft);
@@ -410,6 +362,28 @@ TEST_F(Commands, EveryDraftPassesTheCheckAndMusicItCannotUseGetsItsMessage)
         EXPECT_NE(run.err.find(message), std::string::npos) << run.err;
         EXPECT_FALSE(std::filesystem::exists(draft)) << unusable;
     }
+}
+
+// The draft's file-name entry: the music's name within forty bytes, never
+// cut inside a character ("あ" is 82 A0), never ending the entry early.
+TEST(DraftName, IsTheFileNameWithinFortyBytesAndNeverEndsTheEntryEarly)
+{
+    const std::string a20 = []
+    {
+        std::string text;
+        for (int i = 0; i < 20; ++i)
+            text += "\x82\xA0";
+        return text;
+    }();
+    const std::pair<std::string, std::string> rows[] = {
+        {"C:\\music\\battle.ogg", "battle"},
+        {"/home/u/a;b.tar.wav", "a_b.tar"},
+        {"folder/" + a20 + "\x82\xA0.wav", a20},
+        {"a" + a20 + ".ogg", "a" + a20.substr(2)},
+        {"  .wav", "BGM"},
+    };
+    for (const auto& [path, name] : rows)
+        EXPECT_EQ(cli::DraftName(path), name) << path;
 }
 
 // The tool's own file, found from TEMP as the tool finds it, where the
