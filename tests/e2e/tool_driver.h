@@ -35,9 +35,8 @@ struct MessageBoxSeen
 class ToolProcess
 {
 public:
-    // Starts the tool (or `program`) that lies beside the test executable,
-    // with the test's own environment: a TempSaveFolder made before gives it
-    // its TEMP.
+    // Starts `program` from beside the test executable, with the test's own
+    // environment: a TempSaveFolder made before gives it its TEMP.
     explicit ToolProcess(const std::string& program = "VEKConfig.exe",
                          const std::string& arguments = "");
     ~ToolProcess();

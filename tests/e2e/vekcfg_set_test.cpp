@@ -20,13 +20,13 @@ TEST(Vekcfg, AValueSetOnTheCommandLineShowsOnTheToolsPage)
     e2e::ToolProcess tool;
     const HWND dialog = tool.MainDialog();
     ASSERT_NE(dialog, nullptr);
-    std::string seen;
     // The dialog shows before its pages are filled.
-    e2e::WaitFor(
+    std::string seen;
+    EXPECT_TRUE(e2e::WaitFor(
         [&]
         {
             seen = e2e::WindowText(e2e::FindControl(dialog, IDC_SCREEN_SIZE));
             return seen == "1280×960";
-        });
-    EXPECT_EQ(seen, "1280×960");
+        }))
+        << seen;
 }
