@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <fcntl.h>
 #include <spawn.h>
+#include <sys/resource.h>
 #include <sys/wait.h>
 #include <time.h>
 #include <unistd.h>
@@ -52,7 +53,9 @@ Spawned Run(const std::vector<std::string>& arguments, bool capture)
                 result.output.append(chunk, std::size_t(got));
             close(channel[0]);
         }
-        waitpid(child, &result.status, 0);
+        rusage usage{};
+        wait4(child, &result.status, 0, &usage);
+        result.peakKilobytes = usage.ru_maxrss;
     }
     result.seconds = Now() - start;
     posix_spawn_file_actions_destroy(&actions);

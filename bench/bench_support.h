@@ -19,6 +19,8 @@ struct Spawned
     double seconds = 0.0;
     int status = -1;
     std::string output;
+    // The process's peak resident set.
+    long peakKilobytes = 0;
 };
 
 // Runs `arguments` (the program is found on PATH) to its end and times it;

@@ -27,10 +27,23 @@ struct Split
     std::vector<std::string> operands;
     std::string svgPath;
     bool svgGiven = false;
+    std::string jobs;
+    bool jobsGiven = false;
     std::string error;
 };
 
-Split SplitArguments(const std::vector<std::string>& arguments, std::size_t first, bool takesSvg)
+// How many rows check-config checks at once: a whole number from 1 up.
+bool ReadJobs(const std::string& text, int* jobs)
+{
+    if (text.empty() || text.size() > 4 ||
+        text.find_first_not_of("0123456789") != std::string::npos)
+        return false;
+    *jobs = std::stoi(text);
+    return *jobs >= 1;
+}
+
+Split SplitArguments(const std::vector<std::string>& arguments, std::size_t first, bool takesSvg,
+                     bool takesJobs)
 {
     Split split;
     bool optionsEnded = false;
@@ -56,6 +69,17 @@ Split SplitArguments(const std::vector<std::string>& arguments, std::size_t firs
             else
                 split.svgPath = arguments[++i];
             split.svgGiven = true;
+            continue;
+        }
+        if (takesJobs && argument.rfind("-j", 0) == 0)
+        {
+            if (split.jobsGiven)
+                split.error = "-j is given twice";
+            else if (argument.size() > 2)
+                split.jobs = argument.substr(2);
+            else if (i + 1 < arguments.size())
+                split.jobs = arguments[++i];
+            split.jobsGiven = true;
             continue;
         }
         split.options.push_back(argument);
@@ -97,12 +121,17 @@ ParsedCommandLine ParseCommandLine(const std::vector<std::string>& arguments)
     const bool check = name == "check";
     const bool checkConfig = name == "check-config";
     const bool show = name == "show";
-    if (!check && !checkConfig && !show)
+    const bool set = name == "set";
+    const bool apply = name == "apply";
+    const bool draft = name == "draft";
+    if (!check && !checkConfig && !show && !set && !apply && !draft)
         return Refuse("unknown command \"" + name + "\"");
 
-    Split split = SplitArguments(arguments, 1, check);
+    Split split = SplitArguments(arguments, 1, check, checkConfig);
     if (!split.error.empty())
         return Refuse(split.error);
+    if (split.jobsGiven && !ReadJobs(split.jobs, &invocation.jobs))
+        return Refuse("-j needs the number of rows to check at once, 1 or more");
     for (const std::string& option : split.options)
     {
         if (check && option == "--details" && !invocation.details)
@@ -122,6 +151,43 @@ ParsedCommandLine ParseCommandLine(const std::vector<std::string>& arguments)
         invocation.musicPath = split.operands[0];
         invocation.tensionPath = split.operands[1];
     }
+    else if (set)
+    {
+        // FILE is the first operand that assigns nothing.
+        std::vector<std::string>& operands = split.operands;
+        std::size_t next = 0;
+        if (!operands.empty() && operands[0].find('=') == std::string::npos)
+            invocation.settingsPath = operands[next++];
+        if (next == operands.size())
+            return Refuse("set needs at least one NAME=VALUE");
+        for (; next < operands.size(); ++next)
+        {
+            if (operands[next].find('=') == std::string::npos)
+                return Refuse("set takes NAME=VALUE, NAME+=VALUE or NAME-=VALUE, not \"" +
+                              operands[next] + "\"");
+            invocation.assignments.push_back(operands[next]);
+        }
+        invocation.command = Command::Set;
+    }
+    else if (apply || draft)
+    {
+        if (split.operands.empty() || split.operands.size() > 2)
+            return Refuse(apply ? "apply needs [FILE] SETTINGS.json" : "draft needs MUSIC [OUT]");
+        if (apply)
+        {
+            invocation.command = Command::Apply;
+            invocation.jsonPath = split.operands.back();
+            if (split.operands.size() == 2)
+                invocation.settingsPath = split.operands[0];
+        }
+        else
+        {
+            invocation.command = Command::Draft;
+            invocation.musicPath = split.operands[0];
+            if (split.operands.size() == 2)
+                invocation.outputPath = split.operands[1];
+        }
+    }
     else
     {
         if (split.operands.size() > 1)
@@ -137,8 +203,11 @@ ParsedCommandLine ParseCommandLine(const std::vector<std::string>& arguments)
 std::string UsageText()
 {
     return "usage: vekcfg check [--details] [--svg OUT.svg] MUSIC TENSION\n"
-           "       vekcfg check-config [FILE]\n"
+           "       vekcfg check-config [-j N] [FILE]\n"
            "       vekcfg show [--json] [FILE]\n"
+           "       vekcfg set [FILE] NAME=VALUE...\n"
+           "       vekcfg apply [FILE] SETTINGS.json\n"
+           "       vekcfg draft MUSIC [OUT]\n"
            "       vekcfg --help | --version\n";
 }
 
@@ -156,19 +225,34 @@ std::string HelpText()
            "                   length, the segments in time order, each level's total time\n"
            "                   and segment count against its limits, and the finale\n"
            "    --svg OUT.svg  also draws the timeline into OUT.svg\n"
-           "check-config [FILE]\n"
+           "check-config [-j N] [FILE]\n"
            "    Checks every music row of a settings file whose music is set, one line per\n"
-           "    row: row, music, tension and result, separated by tabs.\n"
+           "    row in row order: row, music, tension and result, separated by tabs.\n"
+           "    -j N           checks N rows at once (default: one per core)\n"
            "show [FILE]\n"
            "    Prints every setting by its name with its meaning; --json as JSON.\n"
+           "set [FILE] NAME=VALUE...\n"
+           "    Sets each named setting and saves the file. NAME is as show prints it; VALUE\n"
+           "    is a number or the meaning show prints for it (1280x960, UP, BUTTON3, on).\n"
+           "    NAME+=ADDRESS and NAME-=ADDRESS add to and remove from network.connectList,\n"
+           "    network.allowList and network.denyList.\n"
+           "apply [FILE] SETTINGS.json\n"
+           "    Sets every setting of a tree that show --json printed, whole or in part;\n"
+           "    - reads it from standard input.\n"
+           "draft MUSIC [OUT]\n"
+           "    Writes a tension file for MUSIC that the check accepts, to OUT or to\n"
+           "    standard output.\n"
            "\n"
            "FILE is a \"GameConfig.dat\". On Windows it defaults to the tool's own, found\n"
-           "from TEMP as the tool finds it; elsewhere it must be given. It is only read.\n"
-           "Paths inside it are used as stored (relative ones from the current folder).\n"
+           "from TEMP as the tool finds it; elsewhere it must be given. Only set and apply\n"
+           "write it: every value is checked first, and nothing is written when one is\n"
+           "refused. Paths inside it are used as stored (relative ones from the current\n"
+           "folder).\n"
            "\n"
            "Exit status: 0 success (check-config: every checked row passes), 1 a check\n"
-           "failed, 2 a usage error, an unreadable settings file, or a file that could\n"
-           "not be written.\n";
+           "failed, music draft cannot use, or a settings file that could not be saved\n"
+           "(it is left as it was), 2 a usage error, a refused value, an unreadable\n"
+           "settings file, or a file that could not be written.\n";
 }
 
 } // namespace cli

@@ -19,6 +19,9 @@ enum class Command
     Check,
     CheckConfig,
     Show,
+    Set,
+    Apply,
+    Draft,
 };
 
 struct Invocation
@@ -29,10 +32,19 @@ struct Invocation
     std::string svgPath; // empty: no picture
     std::string musicPath;
     std::string tensionPath;
-    // check-config, show; empty: the platform's default file
+    // check-config, show, set, apply; empty: the platform's default file
     std::string settingsPath;
     // show
     bool json = false;
+    // check-config: rows checked at once; 0: one per core.
+    int jobs = 0;
+    // set: "NAME=VALUE", "NAME+=VALUE", "NAME-=VALUE", as given
+    std::vector<std::string> assignments;
+    // apply: a JSON settings tree, "-" for standard input
+    std::string jsonPath;
+    // draft: the music (musicPath) and where the tension file goes; empty:
+    // standard output
+    std::string outputPath;
 };
 
 struct ParsedCommandLine

@@ -56,6 +56,33 @@ std::string Utf8FromCp932(std::string_view text)
     return converted;
 }
 
+bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
+{
+    iconv_t converter = iconv_open("CP932", "UTF-8");
+    if (converter == reinterpret_cast<iconv_t>(-1))
+        return false;
+    std::string converted(utf8.size() * 2 + 1, '\0');
+    char* in = const_cast<char*>(utf8.data());
+    std::size_t inLeft = utf8.size();
+    char* out = converted.data();
+    std::size_t outLeft = converted.size();
+    // Two bytes at most for each character of one byte or more: room enough.
+    const bool done =
+        iconv(converter, &in, &inLeft, &out, &outLeft) != static_cast<std::size_t>(-1) &&
+        inLeft == 0;
+    iconv_close(converter);
+    if (!done)
+        return false;
+    converted.resize(converted.size() - outLeft);
+    *cp932 = std::move(converted);
+    return true;
+}
+
+std::string Utf8FromInput(std::string_view bytes)
+{
+    return std::string(bytes);
+}
+
 std::string Utf8FromNative(std::string_view text)
 {
     return std::string(text);

@@ -57,6 +57,45 @@ std::string Utf8FromCp932(std::string_view text)
     return converted;
 }
 
+bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
+{
+    if (utf8.empty())
+    {
+        cp932->clear();
+        return true;
+    }
+    const int length = MultiByteToWideChar(CP_UTF8, MB_ERR_INVALID_CHARS, utf8.data(),
+                                           static_cast<int>(utf8.size()), nullptr, 0);
+    if (length <= 0)
+        return false;
+    std::wstring wide(static_cast<std::size_t>(length), L'\0');
+    MultiByteToWideChar(CP_UTF8, 0, utf8.data(), static_cast<int>(utf8.size()), wide.data(),
+                        length);
+    BOOL replaced = FALSE;
+    const int bytes = WideCharToMultiByte(932, WC_NO_BEST_FIT_CHARS, wide.data(), length, nullptr,
+                                          0, nullptr, &replaced);
+    if (bytes <= 0 || replaced)
+        return false;
+    std::string converted(static_cast<std::size_t>(bytes), '\0');
+    WideCharToMultiByte(932, WC_NO_BEST_FIT_CHARS, wide.data(), length, converted.data(), bytes,
+                        nullptr, &replaced);
+    if (replaced)
+        return false;
+    *cp932 = std::move(converted);
+    return true;
+}
+
+std::string Utf8FromInput(std::string_view bytes)
+{
+    if (bytes.empty() || MultiByteToWideChar(CP_UTF8, MB_ERR_INVALID_CHARS, bytes.data(),
+                                             static_cast<int>(bytes.size()), nullptr, 0) > 0)
+        return std::string(bytes);
+    UINT codePage = GetConsoleOutputCP();
+    if (codePage == 0)
+        codePage = GetACP();
+    return Narrow(Wide(bytes, codePage), CP_UTF8);
+}
+
 std::string Utf8FromNative(std::string_view text)
 {
     return Narrow(Wide(text, CP_ACP), CP_UTF8);

@@ -1,11 +1,8 @@
 #include "cli/settings_report.h"
 
 #include "cli/encoding.h"
-#include "config/fixed_text.h"
+#include "config/field_table.h"
 #include "config/ip_address.h"
-#include "config/setting_names.h"
-#include "config/volume.h"
-#include "input/name_tables.h"
 
 #include <cstdio>
 
@@ -16,231 +13,112 @@ namespace
 
 using Kind = Setting::Kind;
 
-Setting Group(std::string name)
+Setting Node(Kind kind, std::string name)
 {
     Setting setting;
-    setting.kind = Kind::Group;
+    setting.kind = kind;
     setting.name = std::move(name);
-    return setting;
-}
-
-Setting List(std::string name)
-{
-    Setting setting = Group(std::move(name));
-    setting.kind = Kind::List;
-    return setting;
-}
-
-Setting Number(std::string name, long long value, std::string meaning = std::string())
-{
-    Setting setting;
-    setting.kind = Kind::Number;
-    setting.name = std::move(name);
-    setting.number = value;
-    setting.meaning = std::move(meaning);
     return setting;
 }
 
 Setting Text(std::string name, std::string utf8, std::string meaning = std::string())
 {
-    Setting setting;
-    setting.kind = Kind::Text;
-    setting.name = std::move(name);
+    Setting setting = Node(Kind::Text, std::move(name));
     setting.text = std::move(utf8);
     setting.meaning = std::move(meaning);
     return setting;
 }
 
-template <std::size_t N> std::string Field(const char (&field)[N])
+Setting& Child(Setting& parent, Kind kind, const std::string& name)
 {
-    return Utf8FromCp932(config::FieldText(field));
-}
-
-std::string OnOff(std::uint32_t value)
-{
-    return value != 0 ? "on" : "off";
-}
-
-template <std::size_t N>
-Setting Choice(std::string name, long long value, const char* const (&choices)[N])
-{
-    const bool known = value >= 0 && value < static_cast<long long>(N);
-    return Number(std::move(name), value,
-                  known ? Utf8FromCp932(choices[value]) : std::string("no such choice"));
-}
-
-Setting Volume(std::string name, std::int32_t value)
-{
-    if (value == config::kSilentVolume)
-        return Number(std::move(name), value, "silent");
-    char decibels[32];
-    std::snprintf(decibels, sizeof decibels, "%.2f dB", value / 100.0);
-    return Number(std::move(name), value, decibels);
-}
-
-std::string ActionMeaning(int action, const char* name)
-{
-    const std::string label = Utf8FromCp932(config::kActionLabels[action]);
-    return label + ": " + (*name != '\0' ? std::string(name) : std::string("(no name)"));
-}
-
-Setting Graphics(const config::ConfigGraphics& graphics)
-{
-    Setting group = Group("graphics");
-    group.children.push_back(Choice("screenSize", graphics.screenSize, config::kResolutionNames));
-    group.children.push_back(Number("fullScreen", graphics.fullScreen, OnOff(graphics.fullScreen)));
-    group.children.push_back(Number("showMovie", graphics.showMovie, OnOff(graphics.showMovie)));
-    group.children.push_back(Choice("hdrLevel", graphics.hdrLevel, config::kHdrLevelNames));
-    group.children.push_back(
-        Choice("trailQuality", graphics.trailQuality, config::kTrailQualityNames));
-    return group;
-}
-
-Setting Game(const config::ConfigGame& game)
-{
-    Setting group = Group("game");
-    auto& children = group.children;
-    children.push_back(Number("screenShake", game.screenShake, OnOff(game.screenShake)));
-    children.push_back(Number("padVibration", game.padVibration, OnOff(game.padVibration)));
-    children.push_back(Volume("bgmVolume", game.bgmVolume));
-    children.push_back(Volume("seVolume", game.seVolume));
-    children.push_back(Volume("voiceVolume", game.voiceVolume));
-    children.push_back(Number("voicePlayback", game.voicePlayback, OnOff(game.voicePlayback)));
-    children.push_back(Choice("lockOnType", game.lockOnType, config::kLockOnTypeNames));
-    children.push_back(Choice("radarType", game.radarType, config::kRadarTypeNames));
-    children.push_back(Choice("cameraPosition", game.cameraPosition, config::kCameraPositionNames));
-    children.push_back(
-        Choice("guardCorrection", game.guardCorrection, config::kGuardCorrectionNames));
-    children.push_back(
-        Choice("arcadeDifficulty", game.arcadeDifficulty, config::kArcadeDifficultyNames));
-    children.push_back(Number("captureEnabled", game.captureEnabled, OnOff(game.captureEnabled)));
-    children.push_back(Choice("captureSize", game.captureSize, config::kResolutionNames));
-    return group;
-}
-
-Setting Network(const config::CSaveConfig& record)
-{
-    const config::ConfigNetwork& network = *record.Network();
-    Setting group = Group("network");
-    auto& children = group.children;
-    children.push_back(Number("port", network.port));
-    children.push_back(Number("useUpnp", network.useUpnp, OnOff(network.useUpnp)));
-    children.push_back(Choice("keyResponse", network.keyResponse, config::kKeyResponseNames));
-    children.push_back(Text("lobbyId", Field(network.lobbyId)));
-    children.push_back(Text("directId", Field(network.directId)));
-
-    // The lists as the network page lists them: the filled 接続 slots in
-    // slot order, then every 許可 and 拒否 entry.
-    Setting connect = List("connectList");
-    for (const config::IpEntry& entry : network.connectList)
+    for (Setting& child : parent.children)
     {
-        if (!config::IsConnectSlotEmpty(entry))
-            connect.children.push_back(Text("", config::ConnectLine(entry)));
+        if (child.name == name)
+            return child;
     }
-    children.push_back(std::move(connect));
-    Setting allow = List("allowList");
-    for (std::uint32_t i = 0; i < network.allowCount; ++i)
-        allow.children.push_back(
-            Text("", Utf8FromCp932(config::ListedLine(*record.GetAllowEntry(i)))));
-    children.push_back(std::move(allow));
-    Setting deny = List("denyList");
-    for (std::uint32_t i = 0; i < network.denyCount; ++i)
-        deny.children.push_back(
-            Text("", Utf8FromCp932(config::ListedLine(*record.GetDenyEntry(i)))));
-    children.push_back(std::move(deny));
-
-    children.push_back(Number("playBgm", network.playBgm, OnOff(network.playBgm)));
-    return group;
+    parent.children.push_back(Node(kind, name));
+    return parent.children.back();
 }
 
-Setting Replay(const config::ConfigReplay& replay)
+Setting& Element(Setting& list, int index)
 {
-    Setting group = Group("replay");
-    group.children.push_back(Number("saveReplays", replay.saveReplays, OnOff(replay.saveReplays)));
-    Setting locks = List("replayLock");
-    for (int i = 0; i < config::kReplayCount; ++i)
-    {
-        const std::uint32_t locked = replay.replayLock[i];
-        locks.children.push_back(Number("", locked,
-                                        Utf8FromCp932("リプレイ") + std::to_string(i + 1) + ": " +
-                                            (locked != 0 ? "locked" : "unlocked")));
-    }
-    group.children.push_back(std::move(locks));
-    return group;
+    while (static_cast<int>(list.children.size()) <= index)
+        list.children.push_back(Node(Kind::Group, ""));
+    return list.children[static_cast<std::size_t>(index)];
 }
 
-Setting UserBgm(const config::ConfigUserBgm& userBgm)
+// Puts a value where its name says: "keys.padConfigs[1].buttons[14]" is
+// element 14 of list "buttons" in element 1 of list "padConfigs" in group
+// "keys".
+void Place(Setting& root, const config::FieldAt& at, Setting leaf)
 {
-    Setting group = Group("userBgm");
-    Setting rows = List("rows");
-    for (const config::UserBgmRow& stored : userBgm.rows)
+    const std::string pattern = at.field->name;
+    Setting* node = &root;
+    int dimension = 0;
+    std::size_t start = 0;
+    while (true)
     {
-        Setting row = Group("");
-        row.children.push_back(Text("musicPath", Field(stored.musicPath)));
-        row.children.push_back(Text("tensionPath", Field(stored.tensionPath)));
-        rows.children.push_back(std::move(row));
-    }
-    group.children.push_back(std::move(rows));
-    return group;
-}
-
-// Only the low byte of a stored code names it, as on the key pages.
-Setting Keys(const config::ConfigKeys& keys)
-{
-    Setting group = Group("keys");
-    Setting keyboard = List("keyboardKeys");
-    for (int action = 0; action < config::kActionCount; ++action)
-    {
-        const std::uint32_t code = keys.keyboardKeys[action];
-        keyboard.children.push_back(Number(
-            "", code, ActionMeaning(action, input::KeyName(static_cast<std::uint8_t>(code)))));
-    }
-    group.children.push_back(std::move(keyboard));
-
-    Setting players = List("padConfigs");
-    for (int player = 0; player < config::kPlayerCount; ++player)
-    {
-        const config::PadConfig& pad = keys.padConfigs[player];
-        Setting assignment = Group("");
-        Setting buttons = List("buttons");
-        for (int action = 0; action < config::kActionCount; ++action)
+        const std::size_t dot = pattern.find('.', start);
+        std::string part = pattern.substr(start, dot == std::string::npos ? dot : dot - start);
+        const bool last = dot == std::string::npos;
+        const bool indexed = part.size() > 2 && part.compare(part.size() - 2, 2, "[]") == 0;
+        if (indexed)
+            part.resize(part.size() - 2);
+        if (last && !indexed)
         {
-            const std::uint32_t code = pad.buttons[action];
-            buttons.children.push_back(Number(
-                "", code,
-                ActionMeaning(action, input::PadButtonName(static_cast<std::uint8_t>(code)))));
+            leaf.name = part;
+            node->children.push_back(std::move(leaf));
+            return;
         }
-        assignment.children.push_back(std::move(buttons));
-        assignment.children.push_back(Number("device", pad.device,
-                                             std::to_string(player + 1) + "P: game controller " +
-                                                 std::to_string(pad.device) +
-                                                 " in enumeration order"));
-        players.children.push_back(std::move(assignment));
+        if (!indexed)
+        {
+            node = &Child(*node, Kind::Group, part);
+            start = dot + 1;
+            continue;
+        }
+        Setting& list = Child(*node, Kind::List, part);
+        Setting& element = Element(list, at.index[dimension++]);
+        if (last)
+        {
+            leaf.name.clear();
+            element = std::move(leaf);
+            return;
+        }
+        node = &element;
+        start = dot + 1;
     }
-    group.children.push_back(std::move(players));
-    return group;
 }
 
-Setting RadioChat(const config::ConfigRadioChat& radioChat)
+// The 接続 list shows a slot by its numbers; one that reads as all zero is
+// not listed and takes the next address.
+std::string ConnectMeaning(const config::IpEntry& slot)
 {
-    Setting group = Group("radioChat");
-    Setting entries = List("entries");
-    for (int i = 0; i < config::kRadioChatCount; ++i)
+    return config::IsConnectSlotEmpty(slot) ? "empty: not listed, the next address takes it"
+                                            : config::ConnectLine(slot);
+}
+
+Setting Describe(const config::CSaveConfig& record, const config::FieldAt& at)
+{
+    const config::FieldDescription& field = *at.field;
+    if (config::IsListKind(field.kind))
     {
-        const config::RadioChatEntry& stored = radioChat.entries[i];
-        std::string key = "F";
-        key += std::to_string(i + 1);
-        const std::string everyone = Utf8FromCp932("全体");
-        Setting entry = Group("");
-        entry.children.push_back(Text("text", Field(stored.text), key));
-        entry.children.push_back(
-            Number("notToAll", stored.notToAll,
-                   key + (stored.notToAll == 0 ? ": to everyone (" + everyone + " checked)"
-                                               : ": not to everyone (" + everyone + " cleared)")));
-        entries.children.push_back(std::move(entry));
+        Setting list = Node(Kind::List, "");
+        for (const config::IpEntry& entry : config::ReadList(record, field.kind))
+        {
+            list.children.push_back(Text("", Utf8FromCp932(config::AddressText(entry)),
+                                         field.kind == config::FieldKind::ConnectList
+                                             ? ConnectMeaning(entry)
+                                             : std::string()));
+        }
+        return list;
     }
-    group.children.push_back(std::move(entries));
-    return group;
+    if (field.kind == config::FieldKind::Text)
+        return Text("", Utf8FromCp932(config::ReadText(record, at)),
+                    Utf8FromCp932(config::TextMeaning(at)));
+    Setting number = Node(Kind::Number, "");
+    number.number = config::ReadNumber(record, at);
+    number.meaning = Utf8FromCp932(config::ValueMeaning(at, number.number));
+    return number;
 }
 
 // Control characters would break a line of the text form or a JSON string.
@@ -363,16 +241,22 @@ Setting DescribeSettings(const config::CSaveConfig& record, const std::string& p
 {
     char hex[16];
     std::snprintf(hex, sizeof hex, "0x%08X", static_cast<unsigned>(version));
-    Setting root = Group("");
+    Setting root = Node(Kind::Group, "");
     root.children.push_back(Text("file", Utf8FromNative(path)));
-    root.children.push_back(Number("version", version, hex));
-    root.children.push_back(Graphics(*record.Graphics()));
-    root.children.push_back(Game(*record.Game()));
-    root.children.push_back(Network(record));
-    root.children.push_back(Replay(*record.Replay()));
-    root.children.push_back(UserBgm(*record.UserBgm()));
-    root.children.push_back(Keys(*record.Keys()));
-    root.children.push_back(RadioChat(*record.RadioChat()));
+    Setting versionSetting = Node(Kind::Number, "version");
+    versionSetting.number = version;
+    versionSetting.meaning = hex;
+    root.children.push_back(std::move(versionSetting));
+    for (const config::FieldDescription& field : config::Fields())
+    {
+        const int indices = config::IndexCount(field);
+        config::FieldAt at{&field, {0, 0}};
+        for (at.index[0] = 0; at.index[0] < (indices > 0 ? field.counts[0] : 1); ++at.index[0])
+        {
+            for (at.index[1] = 0; at.index[1] < (indices > 1 ? field.counts[1] : 1); ++at.index[1])
+                Place(root, at, Describe(record, at));
+        }
+    }
     return root;
 }
 

@@ -1,9 +1,9 @@
 #pragma once
 
-// What `vekcfg show` prints: every setting of a record by its field name,
-// with its value and what the value means to the tool (the texts of the
-// choices, volumes in decibels, key and button names per action, addresses
-// in the forms the network page lists them).
+// What `vekcfg show` prints: every setting of a record by the name the field
+// table gives it, with its value and what the value means to the tool (the
+// texts of the choices, volumes in decibels, key and button names per
+// action; addresses as stored, and for the 接続 list as the page lists them).
 
 #include "config/save_config.h"
 

@@ -1,14 +1,21 @@
 #include "cli/vekcfg.h"
 
+#include "base/atomic_file.h"
 #include "cli/check_report.h"
 #include "cli/command_line.h"
 #include "cli/encoding.h"
+#include "cli/json.h"
 #include "cli/platform.h"
+#include "cli/row_checks.h"
+#include "cli/settings_change.h"
 #include "cli/settings_file.h"
 #include "cli/settings_report.h"
+#include "cli/tension_draft.h"
 #include "cli/timeline_svg.h"
 #include "config/fixed_text.h"
 #include "config/save_config.h"
+#include "sound/sound_buffer.h"
+#include "tension/tension_file.h"
 
 #include <cerrno>
 #include <cstdio>
@@ -121,21 +128,27 @@ int CheckConfig(const Invocation& invocation)
         Complain(reason);
         return kExitTrouble;
     }
-    bool allPassed = true;
+    std::vector<RowCheck> rows;
     for (int row = 0; row < config::kUserBgmRowCount; ++row)
     {
         const config::UserBgmRow& stored = record.UserBgm()->rows[row];
-        const std::string music = config::FieldText(stored.musicPath);
-        if (music.empty())
+        RowCheck check;
+        check.row = row + 1;
+        check.music = config::FieldText(stored.musicPath);
+        if (check.music.empty())
             continue;
-        const std::string tensionPath = config::FieldText(stored.tensionPath);
-        tension::CTextString message;
-        const tension::MusicCheckResult result =
-            tension::CheckMusicRow(music.c_str(), tensionPath.c_str(), &message);
-        allPassed = allPassed && result == tension::MusicCheckResult::Accepted;
-        Print(ConfigRowLine(row + 1, Utf8FromCp932(music), Utf8FromCp932(tensionPath),
-                            Utf8FromCp932(message.CStr())));
+        check.tension = config::FieldText(stored.tensionPath);
+        rows.push_back(std::move(check));
     }
+    bool allPassed = true;
+    CheckRows(rows, invocation.jobs > 0 ? invocation.jobs : DefaultJobs(),
+              [&allPassed](const RowCheck& checked)
+              {
+                  allPassed = allPassed && checked.result == tension::MusicCheckResult::Accepted;
+                  Print(ConfigRowLine(checked.row, Utf8FromCp932(checked.music),
+                                      Utf8FromCp932(checked.tension),
+                                      Utf8FromCp932(checked.message)));
+              });
     return allPassed ? kExitSuccess : kExitCheckFailed;
 }
 
@@ -148,6 +161,153 @@ int Show(const Invocation& invocation)
         return kExitTrouble;
     const Setting settings = DescribeSettings(record, path, version);
     Print(invocation.json ? SettingsJson(settings) : SettingsText(settings));
+    return kExitSuccess;
+}
+
+// Every change is made on a copy of the record, so that a refusal leaves
+// the file as it was; the save is the tool's own, which replaces the file
+// in one step or not at all.
+int ChangeSettings(const Invocation& invocation, const std::vector<SettingChange>& given)
+{
+    config::CSaveConfig record;
+    std::string path;
+    std::uint32_t version = 0;
+    if (!LoadSettings(invocation, record, &path, &version))
+        return kExitTrouble;
+    config::CSaveConfig changed(record);
+    std::string refusal;
+    if (!ApplyChanges(changed, given, &refusal))
+    {
+        Complain(refusal);
+        return kExitTrouble;
+    }
+    if (!changed.SaveToPath(path.c_str()))
+    {
+        Complain("cannot save the settings file \"" + Utf8FromNative(path) +
+                 "\"; it is left as it was");
+        return kExitCheckFailed;
+    }
+    return kExitSuccess;
+}
+
+int Set(const Invocation& invocation)
+{
+    std::vector<SettingChange> changes;
+    for (const std::string& assignment : invocation.assignments)
+    {
+        SettingChange change;
+        ReadAssignment(Utf8FromNative(assignment), &change);
+        changes.push_back(std::move(change));
+    }
+    return ChangeSettings(invocation, changes);
+}
+
+bool ReadAll(std::FILE* file, std::string* bytes)
+{
+    char chunk[4096];
+    for (std::size_t got; (got = std::fread(chunk, 1, sizeof chunk, file)) != 0;)
+        bytes->append(chunk, got);
+    return std::ferror(file) == 0;
+}
+
+int Apply(const Invocation& invocation)
+{
+    std::string bytes;
+    const bool standardInput = invocation.jsonPath == "-";
+    errno = 0;
+    std::FILE* file = standardInput ? stdin : std::fopen(invocation.jsonPath.c_str(), "rb");
+    const bool read = file != nullptr && ReadAll(file, &bytes);
+    const int readError = errno;
+    if (file != nullptr && !standardInput)
+        std::fclose(file);
+    const std::string shown = standardInput
+                                  ? std::string("standard input")
+                                  : std::string("\"") + Utf8FromNative(invocation.jsonPath) + "\"";
+    if (!read)
+    {
+        Complain("cannot read the settings tree " + shown + ": " +
+                 Utf8FromNative(std::strerror(readError != 0 ? readError : EIO)));
+        return kExitTrouble;
+    }
+    JsonValue tree;
+    std::string error;
+    if (!ReadJson(Utf8FromInput(bytes), &tree, &error))
+    {
+        Complain("the settings tree " + shown + " is not JSON: " + error);
+        return kExitTrouble;
+    }
+    std::vector<SettingChange> changes;
+    if (!ChangesFromJson(tree, &changes, &error))
+    {
+        Complain(error);
+        return kExitTrouble;
+    }
+    return ChangeSettings(invocation, changes);
+}
+
+// A file name in the tension file's code page; a character it has no form
+// for becomes "_".
+std::string Cp932Name(const std::string& utf8)
+{
+    std::string name;
+    for (std::size_t i = 0; i < utf8.size();)
+    {
+        const auto lead = static_cast<unsigned char>(utf8[i]);
+        const std::size_t size = lead < 0x80 ? 1 : lead >= 0xF0 ? 4 : lead >= 0xE0 ? 3 : 2;
+        std::string character;
+        name += Cp932FromUtf8(utf8.substr(i, size), &character) ? character : "_";
+        i += size;
+    }
+    return name;
+}
+
+int Draft(const Invocation& invocation)
+{
+    sound::CSound device;
+    std::string reason;
+    if (!StartSoundDevice(device, &reason))
+    {
+        Complain(reason);
+        return kExitTrouble;
+    }
+    // The check's own decode gives the music's length, or the message the
+    // check shows for music it cannot open.
+    float length = 0.0f;
+    tension::CTextString message;
+    const tension::MusicCheckResult opened =
+        tension::CheckMusicRow(invocation.musicPath.c_str(), "", &message,
+                               [&length](const tension::MusicCheckInspection& seen)
+                               {
+                                   if (seen.music != nullptr)
+                                       length = seen.music->GetLength();
+                               });
+    if (opened == tension::MusicCheckResult::MusicUnreadable)
+    {
+        WriteConsoleText(stderr, Utf8FromCp932(message.CStr()) + "\n");
+        return kExitCheckFailed;
+    }
+    const std::string text =
+        DraftTension(DraftName(Cp932Name(Utf8FromNative(invocation.musicPath))), length);
+    // What the check makes of the draft: music too short or too long gets
+    // the check's own messages.
+    tension::CTensionFile draft;
+    tension::CTextString log;
+    if (!draft.ParseForLength(length, text.c_str(), ':', ';', &log))
+    {
+        WriteConsoleText(stderr, Utf8FromCp932(log.CStr()));
+        return kExitCheckFailed;
+    }
+    if (invocation.outputPath.empty())
+    {
+        std::fwrite(text.data(), 1, text.size(), stdout);
+        std::fflush(stdout);
+        return kExitSuccess;
+    }
+    if (!base::WriteFileAtomically(invocation.outputPath.c_str(), text.data(), text.size()))
+    {
+        Complain("cannot write \"" + Utf8FromNative(invocation.outputPath) + "\"");
+        return kExitTrouble;
+    }
     return kExitSuccess;
 }
 
@@ -174,6 +334,12 @@ int RunVekcfg(int argc, const char* const* argv)
         return CheckConfig(invocation);
     case Command::Show:
         return Show(invocation);
+    case Command::Set:
+        return Set(invocation);
+    case Command::Apply:
+        return Apply(invocation);
+    case Command::Draft:
+        return Draft(invocation);
     }
     return kExitTrouble;
 }

@@ -4,6 +4,7 @@
 #include "base/c_runtime.h"
 #include "base/cp932.h"
 #include "base/file_system.h"
+#include "config/field_table.h"
 #include "config/fixed_text.h"
 
 #include <cerrno>
@@ -16,11 +17,6 @@ namespace config
 {
 namespace
 {
-
-constexpr std::uint32_t kDefaultKeyboardKeys[kActionCount] = {
-    0x50, 0x48, 0x4B, 0x4D, 0xC8, 0xD0, 0xCB, 0xCD, 0x11, 0x4F, 0x51, 0x47,
-    0x49, 0x4C, 0x2C, 0x2F, 0x2D, 0x2E, 0x10, 0x1F, 0x1E, 0x20, 0x1C, 0x39,
-};
 
 constexpr std::size_t kEntrySize = sizeof(IpEntry);
 
@@ -460,43 +456,21 @@ bool CSaveConfig::RemoveConnectEntry(std::int32_t index)
 
 bool CSaveConfig::ResetGraphics()
 {
-    graphics_.screenSize = 2;
-    graphics_.fullScreen = 0;
-    graphics_.showMovie = 1;
-    graphics_.hdrLevel = 0;
-    graphics_.trailQuality = 1;
+    ResetFields(*this, "graphics.");
     return true;
 }
 
 bool CSaveConfig::ResetGame()
 {
-    game_.screenShake = 1;
-    game_.padVibration = 1;
-    game_.bgmVolume = 0;
-    game_.seVolume = 0;
-    game_.voiceVolume = 0;
-    game_.voicePlayback = 1;
-    game_.lockOnType = 0;
-    game_.radarType = 0;
-    game_.cameraPosition = 1;
-    game_.guardCorrection = 1;
-    game_.arcadeDifficulty = 1;
-    game_.captureEnabled = 0;
-    game_.captureSize = 0;
+    ResetFields(*this, "game.");
     return true;
 }
 
 bool CSaveConfig::ResetNetwork()
 {
-    std::memset(network_.lobbyId, 0, sizeof network_.lobbyId);
-    std::memset(network_.directId, 0, sizeof network_.directId);
-    std::memset(network_.connectList, 0, sizeof network_.connectList);
-    network_.port = 18000;
-    network_.useUpnp = 0;
-    network_.keyResponse = 1;
+    ResetFields(*this, "network.");
     network_.allowCount = 0;
     network_.denyCount = 0;
-    network_.playBgm = 1;
     base::FreeBlock(allowList_);
     allowList_ = nullptr;
     base::FreeBlock(denyList_);
@@ -506,34 +480,31 @@ bool CSaveConfig::ResetNetwork()
 
 bool CSaveConfig::ResetReplay()
 {
-    replay_.saveReplays = 1;
-    std::memset(replay_.replayLock, 0, sizeof replay_.replayLock);
+    ResetFields(*this, "replay.");
     return true;
 }
 
 bool CSaveConfig::ResetUserBgm()
 {
-    std::memset(&userBgm_, 0, sizeof userBgm_);
+    ResetFields(*this, "userBgm.");
     return true;
 }
 
 bool CSaveConfig::ResetKeys()
 {
-    ResetKeyboardKeys();
-    for (std::uint8_t player = 0; player < kPlayerCount; ++player)
-        ResetPadButtons(player);
+    ResetFields(*this, "keys.");
     return true;
 }
 
 bool CSaveConfig::ResetRadioChat()
 {
-    std::memset(&radioChat_, 0, sizeof radioChat_);
+    ResetFields(*this, "radioChat.");
     return true;
 }
 
 bool CSaveConfig::ResetKeyboardKeys()
 {
-    std::memcpy(keys_.keyboardKeys, kDefaultKeyboardKeys, sizeof keys_.keyboardKeys);
+    ResetFields(*this, "keys.keyboardKeys");
     return true;
 }
 
@@ -541,10 +512,7 @@ bool CSaveConfig::ResetPadButtons(std::uint8_t player)
 {
     if (player >= kPlayerCount)
         return false;
-    PadConfig& pad = keys_.padConfigs[player];
-    for (std::uint32_t action = 0; action < kActionCount; ++action)
-        pad.buttons[action] = action;
-    pad.device = player;
+    ResetFields(*this, "keys.padConfigs", player);
     return true;
 }
 

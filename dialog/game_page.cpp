@@ -1,6 +1,6 @@
 // The Game page: game options, the three volumes and the game's choices.
 #include "app/config_application.h"
-#include "config/setting_names.h"
+#include "config/field_table.h"
 #include "config/volume.h"
 #include "dialog/page_controls.h"
 #include "resources/resource.h"

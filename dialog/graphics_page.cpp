@@ -1,6 +1,6 @@
 // The Graphics page: screen size, HDR, trail quality, full screen and movies.
 #include "app/config_application.h"
-#include "config/setting_names.h"
+#include "config/field_table.h"
 #include "dialog/page_controls.h"
 #include "resources/resource.h"
 

@@ -1,7 +1,7 @@
 // The key-config page: its two sub-pages filled at start-up, and what they
 // share.
 #include "app/config_application.h"
-#include "config/setting_names.h"
+#include "config/field_table.h"
 #include "dialog/key_pages.h"
 #include "resources/resource.h"
 

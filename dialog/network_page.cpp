@@ -3,9 +3,9 @@
 // buttons run. Every change goes into the record at once.
 #include "app/config_application.h"
 #include "app/system.h"
+#include "config/field_table.h"
 #include "config/fixed_text.h"
 #include "config/ip_address.h"
-#include "config/setting_names.h"
 #include "dialog/page_controls.h"
 #include "resources/resource.h"
 

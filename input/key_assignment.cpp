@@ -1,22 +1,11 @@
 #include "input/key_assignment.h"
 
+#include "input/name_tables.h"
+
 namespace input
 {
 namespace
 {
-
-constexpr std::uint8_t kEscapeKey = 0x01;
-constexpr std::uint8_t kF1Key = 0x3B;
-constexpr std::uint8_t kF10Key = 0x44;
-constexpr std::uint8_t kF11Key = 0x57;
-constexpr std::uint8_t kF12Key = 0x58;
-
-// ESCAPE and the function keys keep their fixed meanings in the game.
-bool IsReservedKey(int code)
-{
-    return code == kEscapeKey || (code >= kF1Key && code <= kF10Key) || code == kF11Key ||
-           code == kF12Key;
-}
 
 // Actions 4..7 and 9..12 take the sticks' directions. They are not
 // offered for assignment: a stick drifting through a direction would

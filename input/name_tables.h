@@ -17,4 +17,11 @@ inline constexpr std::size_t kPadButtonNameCount = 64;
 const char* KeyName(std::uint8_t code);
 const char* PadButtonName(std::uint8_t code);
 
+// ESCAPE and the function keys F1 to F12 keep their fixed meanings in the
+// game: no action can have them.
+constexpr bool IsReservedKey(int code)
+{
+    return code == 0x01 || (code >= 0x3B && code <= 0x44) || code == 0x57 || code == 0x58;
+}
+
 } // namespace input

@@ -148,6 +148,36 @@ CSound* CurrentSound()
 
 namespace device
 {
+namespace
+{
+
+// Holds the current device's lock for its scope, when there is one: buffers
+// are made and duplicated under it, so that checks running on several
+// threads share the one device safely.
+class DeviceLock
+{
+public:
+    explicit DeviceLock(CSound* sound)
+        : platform_(sound != nullptr ? sound->GetPlatform() : nullptr)
+    {
+        if (platform_ != nullptr && !platform_->lockCreated)
+            platform_ = nullptr;
+        if (platform_ != nullptr)
+            EnterCriticalSection(&platform_->lock);
+    }
+    ~DeviceLock()
+    {
+        if (platform_ != nullptr)
+            LeaveCriticalSection(&platform_->lock);
+    }
+    DeviceLock(const DeviceLock&) = delete;
+    DeviceLock& operator=(const DeviceLock&) = delete;
+
+private:
+    CSound::Platform* platform_;
+};
+
+} // namespace
 
 bool FillStaticBuffer(IDirectSoundBuffer8* buffer, const void* pcm, DWORD bytes)
 {
@@ -190,6 +220,7 @@ DeviceBuffer* CreateStaticBuffer(const WaveFormat& format, std::uint32_t capsFla
     description.dwBufferBytes = bytes;
     description.lpwfxFormat = reinterpret_cast<WAVEFORMATEX*>(const_cast<WaveFormat*>(&format));
     description.guid3DAlgorithm = GUID_NULL;
+    const DeviceLock locked(sound);
     IDirectSoundBuffer* created = nullptr;
     if (FAILED(sound->GetPlatform()->device->CreateSoundBuffer(&description, &created, nullptr)))
         return nullptr;
@@ -209,6 +240,7 @@ DeviceBuffer* Duplicate(DeviceBuffer* master)
     CSound* sound = CurrentSound();
     if (sound == nullptr)
         return nullptr;
+    const DeviceLock locked(sound);
     IDirectSoundBuffer* duplicate = nullptr;
     if (FAILED(sound->GetPlatform()->device->DuplicateSoundBuffer(
             reinterpret_cast<IDirectSoundBuffer*>(Native(master)), &duplicate)))

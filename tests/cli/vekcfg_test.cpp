@@ -4,6 +4,7 @@
 #include "cli/command_line.h"
 #include "cli/encoding.h"
 #include "cli/platform.h"
+#include "cli/tension_draft.h"
 #include "cli/vekcfg.h"
 #include "config/save_config.h"
 #include "tests/support/audio_fixtures.h"
@@ -151,6 +152,8 @@ TEST_F(Commands, CheckConfigChecksEveryRowWithMusicOneLineEach)
                   Utf8(u8"ClimaxTension 時間オーバー[現在 30.000000 秒です 18 秒以内にしてく"
                        u8"ださい] / Time Data IsCorrect Error!! / 変換エラー!!\n"));
     EXPECT_EQ(run.exitCode, 1);
+    for (const char* jobs : {"1", "4"})
+        EXPECT_EQ(Vekcfg({"check-config", "-j", jobs, settings}).out, run.out) << jobs;
 }
 
 TEST_F(Commands, ShowPrintsEverySettingByNameWithItsMeaning)
@@ -177,7 +180,8 @@ TEST_F(Commands, ShowPrintsEverySettingByNameWithItsMeaning)
          {u8"version = 318771200 (0x13001000)\n", u8"graphics.screenSize = 8 (1920×1080)\n",
           u8"graphics.hdrLevel = 5 (no such choice)\n", u8"game.bgmVolume = -10000 (silent)\n",
           u8"game.seVolume = -1250 (-12.50 dB)\n", u8"game.captureEnabled = 0 (off)\n",
-          u8"network.keyResponse = 1 (2)\n", u8"network.connectList[0] = \"10.10.10.0\"\n",
+          u8"network.keyResponse = 1 (2)\n",
+          u8"network.connectList[0] = \"010.010.010.*\" (10.10.10.0)\n",
           u8"network.allowList[0] = \"010.010.010.*\"\n", u8"network.denyList = (none)\n",
           u8"replay.replayLock[29] = 0 (リプレイ30: unlocked)\n",
           u8"keys.keyboardKeys[4] = 456 (移動上: UP)\n",
@@ -213,6 +217,173 @@ TEST_F(Commands, UsageErrorsAndUnreadableFilesExitTwoWithTheReason)
         EXPECT_EQ(run.out, "") << reason;
         EXPECT_NE(run.err.find(reason), std::string::npos) << run.err;
     }
+}
+
+// An argument as the platform's command line gives it.
+std::string Native(const char8_t* utf8)
+{
+    std::string text = Utf8(utf8);
+#ifdef _WIN32
+    cli::Cp932FromUtf8(Utf8(utf8), &text);
+#endif
+    return text;
+}
+
+// Every page changed, each setting by its number or by what it means.
+std::vector<std::string> ChangeEveryPage(const std::string& file)
+{
+    return {"set", file, "graphics.screenSize=1280x960", "graphics.fullScreen=on",
+            "game.seVolume=-12.50 dB", "keys.keyboardKeys[4]=Z", "keys.keyboardKeys[14]=up",
+            "keys.padConfigs[1].buttons[14]=BUTTON3", "keys.padConfigs[1].buttons[16]=14",
+            "keys.padConfigs[3].device=0", "radioChat.entries[1].notToAll=not to everyone",
+            "radioChat.entries[11].text=" + Native(u8"援護を頼む"), "network.keyResponse=2",
+            "network.lobbyId=" + Native(u8"ロビー"), "network.connectList+=192.168.1.*",
+            // Listed when added, but its slot counts as free.
+            "network.connectList+=*.*.*.*", "network.allowList+=10.0.0.1",
+            "network.allowList+=10.0.0.2", "network.allowList-=010.0.0.1",
+            "replay.replayLock[29]=1", "userBgm.rows[9].musicPath=" + Native(u8"C:\\音楽\\曲.ogg")};
+}
+
+TEST_F(Commands, SetTakesANumberOrAMeaningAndShowReadsItBack)
+{
+    config::CSaveConfig record;
+    record.ResetAll();
+    ASSERT_TRUE(record.SaveToPath(settings.c_str()));
+    const ProgramRun set = Vekcfg(ChangeEveryPage(settings));
+    EXPECT_EQ(set.exitCode, 0) << set.err;
+    EXPECT_EQ(set.out + set.err, "");
+    const std::string out = Vekcfg({"show", settings}).out;
+    for (const char8_t* line : {
+             u8"graphics.screenSize = 3 (1280×960)\n",
+             u8"keys.keyboardKeys[14] = 200 (スライド/決定: UP)\n",
+             u8"keys.padConfigs[1].buttons[14] = 16 (スライド/決定: BUTTON3)\n",
+             u8"keys.padConfigs[1].buttons[16] = 14 (射撃: BUTTON1)\n",
+             u8"radioChat.entries[1].notToAll = 1 (F2: not to everyone (全体 cleared))\n",
+             u8"network.connectList[0] = \"192.168.001.*\" (192.168.1.0)\n",
+             u8"network.allowList[0] = \"010.000.000.002\"\n",
+             u8"userBgm.rows[9].musicPath = \"C:\\音楽\\曲.ogg\"\n",
+         })
+        EXPECT_NE(out.find(Utf8(line)), std::string::npos) << Utf8(line);
+}
+
+TEST_F(Commands, ApplyOfWhatShowPrintsMakesAFileTheToolWroteAgainByteForByte)
+{
+    const std::string defaults = folder.File("defaults.dat"), changed = folder.File("changed.dat");
+    config::CSaveConfig record;
+    record.ResetAll();
+    ASSERT_TRUE(record.SaveToPath(defaults.c_str()));
+    ASSERT_TRUE(record.SaveToPath(changed.c_str()));
+    ASSERT_EQ(Vekcfg(ChangeEveryPage(changed)).exitCode, 0);
+    // Each is applied over the other, so that every value and list changes.
+    const std::string tree = folder.File("tree.json"), target = folder.File("target.dat");
+    for (const auto& [from, over] : {std::pair{defaults, changed}, std::pair{changed, defaults}})
+    {
+        testing_support::WriteBytes(target, ReadBytes(over));
+        Write(tree, Vekcfg({"show", "--json", from}).out);
+        EXPECT_EQ(Vekcfg({"apply", target, tree}).err, "");
+        EXPECT_EQ(ReadBytes(target), ReadBytes(from)) << from;
+    }
+}
+
+TEST_F(Commands, EveryKindOfRefusalExitsTwoNamingTheSettingAndLeavesTheFile)
+{
+    config::CSaveConfig record;
+    record.ResetAll();
+    ASSERT_TRUE(record.SaveToPath(settings.c_str()));
+    std::vector<std::uint8_t> newer = ReadBytes(settings);
+    newer[0] = 0x01;
+    const std::string newerFile = folder.File("newer.dat"), unreadable = folder.File("folder.dat");
+    const std::string broken = folder.File("broken.json"), emoji = folder.File("emoji.json");
+    testing_support::WriteBytes(newerFile, newer);
+    std::filesystem::create_directory(unreadable);
+    Write(broken, "{\"graphics\": {\"screenSize\": 3,}}");
+    // The command line on Windows cannot carry a character that code page
+    // 932 has no form for; JSON can.
+    Write(emoji, "{\"network\": {\"lobbyId\": \"\\ud83d\\ude00\"}}");
+    const std::string tooLong = "radioChat.entries[0].text=" + std::string(38, 'r');
+    std::vector<std::string> overFull{"set", settings};
+    for (int slot = 0; slot <= config::kConnectSlotCount; ++slot)
+        overFull.push_back("network.connectList+=10.0.0." + std::to_string(slot + 1));
+
+    const struct
+    {
+        const char* kind;
+        std::vector<std::string> arguments;
+        std::string named;
+    } rows[] = {
+        {"unknown name", {"set", settings, "graphics.size=1"}, "graphics.size"},
+        {"out of range", {"set", settings, "graphics.screenSize=12"}, "graphics.screenSize: "},
+        {"newer version", {"set", newerFile, "graphics.screenSize=1"}, "newer.dat"},
+        {"missing file", {"set", missing, "graphics.screenSize=1"}, missing},
+        {"unreadable file", {"set", unreadable, "graphics.screenSize=1"}, "folder.dat"},
+        {"not in code page 932", {"apply", settings, emoji}, "network.lobbyId: "},
+        {"text too long", {"set", settings, tooLong}, "radioChat.entries[0].text: "},
+        {"list over 24", overFull, "network.connectList: "},
+        {"bad JSON", {"apply", settings, broken}, "line 1, column 31"},
+    };
+    const auto contents = [](const std::string& file) {
+        return std::filesystem::is_regular_file(file) ? ReadBytes(file)
+                                                      : std::vector<std::uint8_t>();
+    };
+    for (const auto& row : rows)
+    {
+        const std::string& file = row.arguments[1];
+        const std::vector<std::uint8_t> before = contents(file);
+        const ProgramRun run = Vekcfg(row.arguments);
+        EXPECT_EQ(run.exitCode, 2) << row.kind;
+        EXPECT_NE(run.err.find(row.named), std::string::npos) << row.kind << ": " << run.err;
+        EXPECT_EQ(contents(file), before) << row.kind;
+    }
+}
+
+// Across the accepted range of music lengths, and the music it cannot use.
+TEST_F(Commands, EveryDraftPassesTheCheckAndMusicItCannotUseGetsItsMessage)
+{
+    const std::string draft = folder.File("draft.txt");
+    const std::pair<double, std::string> rows[] = {
+        {59.999, Utf8(u8"60秒以上の長さのファイルが必要です]\n")},
+        {60.0, ""},
+        {60.001, ""},
+        {99.9, ""},
+        {183.37, ""},
+        {240.0, ""},
+        {479.999, ""},
+        {480.0, ""},
+        {480.001, Utf8(u8"480秒以下の長さのファイルが必要です]\n")},
+    };
+    for (const auto& [seconds, refusal] : rows)
+    {
+        testing_support::WriteBytes(music, testing_support::MakeWaveOfLength(seconds));
+        std::filesystem::remove(draft);
+        const ProgramRun run = Vekcfg({"draft", music, draft});
+        EXPECT_EQ(run.exitCode, refusal.empty() ? 0 : 1) << seconds;
+        EXPECT_NE(run.err.find(refusal), std::string::npos) << run.err;
+        // Without OUT the same text goes to standard output.
+        const std::vector<std::uint8_t> drafted = ReadBytes(draft);
+        EXPECT_EQ(Vekcfg({"draft", music}).out, std::string(drafted.begin(), drafted.end()));
+        if (refusal.empty())
+        {
+            EXPECT_EQ(Vekcfg({"check", music, draft}).out, kAccepted) << seconds;
+        }
+    }
+}
+
+// The draft's file-name entry: the music's name within forty bytes, never
+// cut inside a character ("あ" is 82 A0), never ending the entry early.
+TEST(DraftName, IsTheFileNameWithinFortyBytesAndNeverEndsTheEntryEarly)
+{
+    std::string a20;
+    for (int i = 0; i < 20; ++i)
+        a20 += "\x82\xA0";
+    const std::pair<std::string, std::string> rows[] = {
+        {"C:\\music\\battle.ogg", "battle"},
+        {"/home/u/a;b.tar.wav", "a_b.tar"},
+        {"folder/" + a20 + "\x82\xA0.wav", a20},
+        {"a" + a20 + ".ogg", "a" + a20.substr(2)},
+        {"  .wav", "BGM"},
+    };
+    for (const auto& [path, name] : rows)
+        EXPECT_EQ(cli::DraftName(path), name) << path;
 }
 
 // The tool's own file, found from TEMP as the tool finds it, where the

@@ -210,5 +210,12 @@ int main(int argc, char** argv)
         corpus.Case(std::string("show --json ") + settings);
     }
     corpus.Case("show unterminated.dat");
+    for (const char* music : {"music.wav", "music.ogg", "short.wav", "missing.wav"})
+        corpus.Case(std::string("draft ") + music);
+    // Each build's set writes the same file: a second run changes nothing.
+    corpus.Case("set rows.dat graphics.screenSize=1280x960 keys.keyboardKeys[4]=Z "
+                "keys.keyboardKeys[14]=UP radioChat.entries[1].text=roger");
+    corpus.Case("set rows.dat graphics.screenSize=1280x961");
+    corpus.Case("show rows.dat");
     return 0;
 }

@@ -38,12 +38,12 @@ HWND FindControl(HWND dialog, int id)
     return search.second;
 }
 
-ToolProcess::ToolProcess()
+ToolProcess::ToolProcess(const std::string& program, const std::string& arguments)
 {
     char path[MAX_PATH] = {};
     GetModuleFileNameA(nullptr, path, sizeof path);
     std::string command =
-        "\"" + std::string(path, std::strrchr(path, '\\') + 1) + "VEKConfig.exe\"";
+        "\"" + std::string(path, std::strrchr(path, '\\') + 1) + program + "\" " + arguments;
     STARTUPINFOA startup = {};
     startup.cb = sizeof startup;
     CreateProcessA(nullptr, command.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &startup,

@@ -35,9 +35,10 @@ struct MessageBoxSeen
 class ToolProcess
 {
 public:
-    // Starts the tool that lies beside the test executable, with the test's
-    // own environment: a TempSaveFolder made before gives it its TEMP.
-    ToolProcess();
+    // Starts `program` from beside the test executable, with the test's own
+    // environment: a TempSaveFolder made before gives it its TEMP.
+    explicit ToolProcess(const std::string& program = "VEKConfig.exe",
+                         const std::string& arguments = "");
     ~ToolProcess();
     ToolProcess(const ToolProcess&) = delete;
     ToolProcess& operator=(const ToolProcess&) = delete;
