@@ -1,6 +1,7 @@
 #include "cli/json.h"
 
 #include <charconv>
+#include <utility>
 
 namespace cli
 {
@@ -317,8 +318,8 @@ private:
             if (Peek() != ':')
                 return Fail("':' expected");
             ++position_;
-            value->members.emplace_back(std::move(name), JsonValue());
-            if (!Value(&value->members.back().second, depth + 1))
+            value->members.push_back(JsonMember{std::move(name), JsonValue()});
+            if (!Value(&value->members.back().value, depth + 1))
                 return false;
             Blanks();
             if (Peek() == '}')

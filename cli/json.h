@@ -7,11 +7,12 @@
 #include <cstdint>
 #include <string>
 #include <string_view>
-#include <utility>
 #include <vector>
 
 namespace cli
 {
+
+struct JsonMember;
 
 struct JsonValue
 {
@@ -34,10 +35,16 @@ struct JsonValue
     std::string number;
     std::string string;
     std::vector<JsonValue> items;
-    std::vector<std::pair<std::string, JsonValue>> members;
+    std::vector<JsonMember> members;
 
     // Null when there is no such member.
     const JsonValue* Member(std::string_view name) const;
+};
+
+struct JsonMember
+{
+    std::string name;
+    JsonValue value;
 };
 
 // False with the reason ("line 3, column 7: ...") when `text` is not one
