@@ -9,7 +9,8 @@
 namespace cli
 {
 
-inline constexpr char kVersion[] = "1.0.0";
+// The project's version, given by the build.
+inline constexpr char kVersion[] = VEK_VERSION;
 
 enum class Command
 {
