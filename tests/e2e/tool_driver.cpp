@@ -96,8 +96,13 @@ SaveFolder::~SaveFolder()
 }
 
 ToolProcess::ToolProcess(const SaveFolder& folder)
+    : ToolProcess(folder, ExecutableDirectory() + "VEKConfig.exe")
 {
-    std::string command = "\"" + ExecutableDirectory() + "VEKConfig.exe\"";
+}
+
+ToolProcess::ToolProcess(const SaveFolder& folder, const std::string& program)
+{
+    std::string command = "\"" + program + "\"";
     std::vector<char> environment = EnvironmentWithTemp(folder.Temp());
     STARTUPINFOA startup = {};
     startup.cb = sizeof startup;

@@ -41,8 +41,9 @@ struct MessageBoxSeen
 class ToolProcess
 {
 public:
-    // Starts the tool that lies beside the test executable.
+    // Starts the tool that lies beside the test executable, or `program`.
     explicit ToolProcess(const SaveFolder& folder);
+    ToolProcess(const SaveFolder& folder, const std::string& program);
     ~ToolProcess();
     ToolProcess(const ToolProcess&) = delete;
     ToolProcess& operator=(const ToolProcess&) = delete;
