@@ -1,37 +1,7 @@
-// Process entry: one application object, its start-up, the message loop and
-// its release. The command line is ignored.
-#include "app/config_application.h"
-
-#include <new>
+// Process entry. The command line is ignored.
+#include "app/tool_main.h"
 
 int WINAPI WinMain(HINSTANCE instance, HINSTANCE, LPSTR, int)
 {
-    CConfigApplication* application = new (std::nothrow) CConfigApplication();
-    if (application == nullptr)
-        return -1;
-    SetApplication(application);
-    if (!application->Init(instance, AppWindowProc))
-        return -1;
-
-    // The loop never waits: with the queue empty it updates continuously, so
-    // that a key or button pressed for an assignment is seen at once.
-    MSG message;
-    for (;;)
-    {
-        if (PeekMessageA(&message, nullptr, 0, 0, PM_REMOVE))
-        {
-            if (message.message == WM_QUIT)
-                break;
-            TranslateMessage(&message);
-            DispatchMessageA(&message);
-            continue;
-        }
-        application->Update();
-        application->Render();
-    }
-
-    application->Exit();
-    delete application;
-    SetApplication(nullptr);
-    return 0;
+    return RunTool(instance, nullptr);
 }

@@ -54,8 +54,11 @@ bool CreateSystemDevice(IDirectInput8A* directInput, REFGUID guid, LPCDIDATAFORM
         ShowError(messages.cooperation);
         return false;
     }
-    // Fails while another window is in the foreground; the polls acquire again.
-    (*device)->Acquire();
+    // Not acquired here: the first poll finds the device unacquired and
+    // acquires it, as every poll does after the window was in the background.
+    // Under Wine an acquired foreground device hooks every message sent on
+    // this thread, which makes creating and filling the pages that follow
+    // far slower, for no read before the first poll.
     return true;
 }
 
@@ -155,9 +158,9 @@ bool CDirectInput::Init(const InputWindow* window)
             joystick = nullptr;
             continue;
         }
+        // Acquired by the first poll, as the keyboard and the mouse are.
         joyInfo[i].dwSize = sizeof(DIDEVICEINSTANCEA);
-        if (SUCCEEDED(joystick->GetDeviceInfo(&joyInfo[i])))
-            joystick->Acquire();
+        joystick->GetDeviceInfo(&joyInfo[i]);
     }
     return true;
 }

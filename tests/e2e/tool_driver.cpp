@@ -42,8 +42,11 @@ ToolProcess::ToolProcess(const std::string& program, const std::string& argument
 {
     char path[MAX_PATH] = {};
     GetModuleFileNameA(nullptr, path, sizeof path);
-    std::string command =
-        "\"" + std::string(path, std::strrchr(path, '\\') + 1) + program + "\" " + arguments;
+    // A full path names the program itself; a bare name, the one beside the test.
+    const std::string folder = program.find(':') == std::string::npos
+                                   ? std::string(path, std::strrchr(path, '\\') + 1)
+                                   : "";
+    std::string command = "\"" + folder + program + "\" " + arguments;
     STARTUPINFOA startup = {};
     startup.cb = sizeof startup;
     CreateProcessA(nullptr, command.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &startup,

@@ -35,8 +35,8 @@ struct MessageBoxSeen
 class ToolProcess
 {
 public:
-    // Starts `program` from beside the test executable, with the test's own
-    // environment: a TempSaveFolder made before gives it its TEMP.
+    // Starts `program` (beside the test executable, unless a full path) with
+    // the test's own environment: a TempSaveFolder made before gives it its TEMP.
     explicit ToolProcess(const std::string& program = "VEKConfig.exe",
                          const std::string& arguments = "");
     ~ToolProcess();
