@@ -43,9 +43,9 @@ TEST(SaveDirectory, IsBuiltBesideTheLastFolderOfTempOrRefused)
     }
     EXPECT_TRUE(fs::is_directory(root.Path() / "Tolvenik" / "VEK"));
 
-    const std::string kept = PathOfLength(root, 259 - 27 - 1, ""); // 27: the parts made
-    ASSERT_FALSE(kept.empty());
-    fs::create_directory(kept);
+    // 27: the parts made below the kept folder.
+    const std::string kept = base + std::string(259 - 27 - 1 - base.size(), 'f');
+    ASSERT_TRUE(fs::create_directory(kept));
     CSaveConfig record;
     {
         ScopedEnvironment temp("TEMP", (kept + sep + "Temp").c_str());
@@ -57,40 +57,33 @@ TEST(SaveDirectory, IsBuiltBesideTheLastFolderOfTempOrRefused)
     EXPECT_FALSE(record.Save());
 }
 
-// A missing or too short file is written with the defaults; a failed save
-// leaves the previous file byte for byte.
-TEST(SaveFile, AMissingFileIsWrittenAndAFailedSaveLeavesThePreviousOne)
+TEST(SaveFile, AMissingFileIsWrittenAndABadFileOrAFailedSaveLeavesThePreviousOne)
 {
     TempSaveFolder folder;
+    const std::string file = folder.SettingsFile(), temporary = base::TemporaryPathFor(file);
     CSaveConfig record;
     ASSERT_TRUE(record.Load());
-    const Bytes defaults = ReadBytes(folder.SettingsFile());
+    const Bytes defaults = ReadBytes(file);
     EXPECT_EQ(defaults.size(), 6876u);
-    EXPECT_FALSE(fs::exists(base::TemporaryPathFor(folder.SettingsFile())));
-    WriteBytes(folder.SettingsFile(), {0x00, 0x10, 0x00});
+    EXPECT_FALSE(fs::exists(temporary));
+    WriteBytes(file, {0x00, 0x10, 0x00});
     ASSERT_TRUE(record.Load());
-    EXPECT_EQ(ReadBytes(folder.SettingsFile()), defaults);
+    EXPECT_EQ(ReadBytes(file), defaults);
     // The temporary file cannot be created: a folder stands at its name.
-    fs::create_directories(base::TemporaryPathFor(folder.SettingsFile()));
+    fs::create_directories(temporary);
     record.Graphics()->screenSize = 5;
     EXPECT_FALSE(record.Save());
-    EXPECT_EQ(ReadBytes(folder.SettingsFile()), defaults);
-    fs::remove(base::TemporaryPathFor(folder.SettingsFile()));
+    EXPECT_EQ(ReadBytes(file), defaults);
+    fs::remove(temporary);
     ASSERT_TRUE(record.Save());
-    EXPECT_EQ(ReadBytes(folder.SettingsFile())[8], 5);
-}
+    EXPECT_EQ(ReadBytes(file)[8], 5);
 
-TEST(SaveFile, BadFilesAreRefusedAndLeftAsTheyWere)
-{
-    TempSaveFolder folder;
-    fs::create_directories(folder.SaveDirectory());
     const Bytes newer = {0x01, 0x10, 0x00, 0x13}; // version 0x13001001
-    WriteBytes(folder.SettingsFile(), newer);
-    CSaveConfig record;
+    WriteBytes(file, newer);
     EXPECT_FALSE(record.Load());
-    EXPECT_EQ(ReadBytes(folder.SettingsFile()), newer);
-    fs::remove(folder.SettingsFile());
-    fs::create_directories(fs::path(folder.SettingsFile()) / "inside");
-    EXPECT_FALSE(record.Load()) << "a folder in place of the file";
-    EXPECT_TRUE(fs::is_directory(fs::path(folder.SettingsFile()) / "inside"));
+    EXPECT_EQ(ReadBytes(file), newer);
+    fs::remove(file);
+    fs::create_directories(fs::path(file) / "inside");
+    EXPECT_FALSE(record.Load());
+    EXPECT_TRUE(fs::is_directory(fs::path(file) / "inside"));
 }

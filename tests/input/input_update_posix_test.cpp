@@ -97,8 +97,7 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     Devices().xinput[1].Gamepad = {XINPUT_GAMEPAD_B, 0, 0, 0, 0, 0, 0};
     in.Update();
     EXPECT_EQ(in.GetJoystickCount(), 2);
-    EXPECT_EQ(in.GetJoystickInfo(0), nullptr);
-    EXPECT_EQ(in.GetJoystickState(0), nullptr);
+    EXPECT_TRUE(in.GetJoystickInfo(0) == nullptr && in.GetJoystickState(0) == nullptr);
     EXPECT_STREQ(in.GetJoystickInfo(1)->tszInstanceName, "Pad");
     EXPECT_EQ(in.GetJoyButton(1, 0) + in.GetJoyButton(1, 32) + in.GetJoyButton(16, 0), 1);
     const InputSlot& slot0 = in.GetSlot(0);
@@ -135,7 +134,6 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     EXPECT_EQ(slot0.analogValid, 0u) << "unplugged, with no controller of its own";
 }
 
-// The pages read the live devices through the same decisions.
 TEST_F(InputUpdate, CapturesReadTheLiveDevices)
 {
     CInput& in = Start(1);
@@ -147,10 +145,8 @@ TEST_F(InputUpdate, CapturesReadTheLiveDevices)
     Devices().keys[0x30] = 0x80;
     Devices().joysticks[0].state.rgbButtons[12] = 0x80;
     in.Update();
-    const Capture key = DecideKeyCapture(keys, 14, in);
-    const Capture button = DecidePadCapture(keys.padConfigs[0], 14, in);
-    EXPECT_EQ(key.changes[1].code, 0x30u);
-    EXPECT_EQ(button.changes[0].code, 24u);
+    EXPECT_EQ(DecideKeyCapture(keys, 14, in).changes[1].code, 0x30u);
+    EXPECT_EQ(DecidePadCapture(keys.padConfigs[0], 14, in).changes[0].code, 24u);
 }
 
 } // namespace

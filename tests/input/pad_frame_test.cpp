@@ -113,8 +113,6 @@ TEST(XInputFrame, ThumbsRestUpTo6000AndPointFrom16383TriggersPressFrom128)
     }
 }
 
-// The movement keys force a stick to full deflection; without them it keeps
-// the device's value.
 TEST(SlotSticks, MovementKeysForceFullDeflection)
 {
     using Axis = float InputSlot::*;

@@ -21,7 +21,7 @@ private:
     std::optional<std::string> previous_;
 };
 
+// A null value removes the variable.
 void SetEnvironment(const char* name, const char* value);
-void ClearEnvironment(const char* name);
 
 } // namespace testing_support

@@ -7,12 +7,7 @@ namespace testing_support
 
 void SetEnvironment(const char* name, const char* value)
 {
-    ::setenv(name, value, 1);
-}
-
-void ClearEnvironment(const char* name)
-{
-    ::unsetenv(name);
+    value != nullptr ? ::setenv(name, value, 1) : ::unsetenv(name);
 }
 
 } // namespace testing_support

@@ -6,16 +6,11 @@
 namespace testing_support
 {
 
+// The C runtime keeps its own copy of the environment beside the process's.
 void SetEnvironment(const char* name, const char* value)
 {
-    ::_putenv_s(name, value);
+    ::_putenv_s(name, value != nullptr ? value : "");
     ::SetEnvironmentVariableA(name, value);
-}
-
-void ClearEnvironment(const char* name)
-{
-    ::_putenv_s(name, "");
-    ::SetEnvironmentVariableA(name, nullptr);
 }
 
 } // namespace testing_support

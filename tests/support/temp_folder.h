@@ -31,23 +31,17 @@ private:
 class TempSaveFolder
 {
 public:
-    TempSaveFolder();
+    TempSaveFolder() : temp_("TEMP", (root_.Path() / "Temp").string().c_str()) {}
 
     // Where the tool keeps "GameConfig.dat" for this TEMP.
-    std::string SettingsFile() const;
-    std::filesystem::path SaveDirectory() const;
+    std::filesystem::path SaveDirectory() const { return root_.Path() / "Tolvenik" / "VEK"; }
+    std::string SettingsFile() const { return (SaveDirectory() / "GameConfig.dat").string(); }
     const TempFolder& Root() const { return root_; }
 
 private:
     TempFolder root_;
     ScopedEnvironment temp_;
 };
-
-// A path inside `folder` of exactly `length` bytes that ends in `ending`,
-// with the folders before its last part created; empty when the folder's own
-// path leaves no room or the folders cannot be made (Windows itself refuses
-// folders of MAX_PATH bytes and more, Wine does not).
-std::string PathOfLength(const TempFolder& folder, std::size_t length, const std::string& ending);
 
 std::vector<std::uint8_t> ReadBytes(const std::string& path);
 void WriteBytes(const std::string& path, const std::vector<std::uint8_t>& bytes);
