@@ -1,6 +1,7 @@
 #include "bench/bench_support.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstdint>
 #include <fcntl.h>
 #include <spawn.h>
@@ -64,21 +65,28 @@ Spawned Run(const std::vector<std::string>& arguments, bool capture)
 
 testing_support::SampleSource MusicSource(long sampleRate)
 {
-    const testing_support::SampleSource tune = testing_support::TuneSource(sampleRate);
-    return [tune, sampleRate](float** channels, int channelCount, int count, std::uint64_t first)
+    return [sampleRate](float** channels, int channelCount, int count, std::uint64_t first)
     {
-        tune(channels, channelCount, count, first);
+        constexpr double kTwoPi = 6.283185307179586;
         static std::uint32_t seed = 12345;
         for (int i = 0; i < count; ++i)
         {
             const std::uint64_t n = first + std::uint64_t(i);
+            const double t = double(n) / double(sampleRate);
+            // A melody of three voices whose notes change every quarter second.
+            const int step = static_cast<int>(t * 4.0);
+            const double root = 220.0 * std::pow(2.0, ((step * 5) % 12) / 12.0);
+            const double tune = 0.25 * std::sin(kTwoPi * root * t) +
+                                0.15 * std::sin(kTwoPi * root * 1.5 * t) +
+                                0.10 * std::sin(kTwoPi * root * 2.01 * t);
             const double beat = double(n % std::uint64_t(sampleRate / 2)) / double(sampleRate);
             const double burst = beat < 0.08 ? 0.35 * (1.0 - beat / 0.08) : 0.0;
             for (int c = 0; c < channelCount; ++c)
             {
                 seed = seed * 1664525u + 1013904223u;
                 const double noise = double(seed >> 8) / double(1u << 24) * 2.0 - 1.0;
-                channels[c][i] += static_cast<float>(noise * (0.06 + burst));
+                channels[c][i] =
+                    static_cast<float>(tune * (c % 2 == 0 ? 1.0 : 0.8) + noise * (0.06 + burst));
             }
         }
     };

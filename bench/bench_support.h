@@ -28,7 +28,7 @@ struct Spawned
 // standard error is always dropped.
 Spawned Run(const std::vector<std::string>& arguments, bool capture);
 
-// Music-like input: the tests' tune with a broadband layer (a soft noise bed
+// Music-like input: a tune of three voices with a broadband layer (a soft noise bed
 // and a noise burst on every beat), so that the encoder spends bits as it
 // does on real music (about 110 kbit/s at quality 0.3) instead of
 // compressing bare tones to almost nothing.

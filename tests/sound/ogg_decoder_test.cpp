@@ -5,29 +5,18 @@
 
 #include <algorithm>
 #include <gtest/gtest.h>
+#include <tuple>
 
 using sound::DecodedAudio;
 using testing_support::Bytes;
 using testing_support::OggFixture;
-
-namespace
-{
-
-bool Silent(const std::uint8_t* begin, const std::uint8_t* end)
-{
-    return std::all_of(begin, end, [](std::uint8_t b) { return b == 0; });
-}
-
-} // namespace
 
 // What the last page announces sizes the block before a sample is decoded:
 // what the pages do not hold, a lost page or a claim beyond them, stays
 // silent; more than the largest sound buffer is refused at once.
 TEST(OggDecoder, TheAnnouncedLengthSizesTheBlockUpToTheLargestSoundBuffer)
 {
-    OggFixture fixture;
-    fixture.channels = 1;
-    fixture.samplesPerChannel = 44100 * 12;
+    const OggFixture fixture{.channels = 1, .samplesPerChannel = 44100 * 12};
     std::vector<Bytes> pages =
         testing_support::SplitOggPages(testing_support::EncodeOggVorbis(fixture));
     ASSERT_GT(pages.size(), 6u) << "pages of audio to lose and to claim more in";
@@ -40,28 +29,26 @@ TEST(OggDecoder, TheAnnouncedLengthSizesTheBlockUpToTheLargestSoundBuffer)
         return claimed;
     };
     pages.erase(pages.begin() + 4);
-    const struct
-    {
-        const char* what;
-        Bytes stream;
-        std::uint64_t samples; // 0: refused
-    } cases[] = {
+    // The stream and the samples decoded, 0 when refused.
+    const std::tuple<const char*, Bytes, std::uint64_t> cases[] = {
         {"a page lost", testing_support::JoinOggPages(pages), fixture.samplesPerChannel},
         {"ten times the samples held", claiming(fixture.samplesPerChannel * 10),
          fixture.samplesPerChannel * 10},
         {"more than the largest sound buffer holds", claiming(sound::kMaxBufferBytes / 2 + 1), 0},
     };
-    for (const auto& c : cases)
+    const auto silent = [](const std::uint8_t* begin, const std::uint8_t* end)
+    { return std::all_of(begin, end, [](std::uint8_t b) { return b == 0; }); };
+    for (const auto& [what, stream, samples] : cases)
     {
         DecodedAudio audio;
-        ASSERT_EQ(sound::DecodeOggVorbisFromMemory(c.stream.data(), c.stream.size(), &audio),
-                  c.samples != 0)
-            << c.what;
-        if (c.samples == 0)
+        ASSERT_EQ(sound::DecodeOggVorbisFromMemory(stream.data(), stream.size(), &audio),
+                  samples != 0)
+            << what;
+        if (samples == 0)
             continue;
-        ASSERT_EQ(audio.dataBytes, c.samples * 2) << c.what;
-        EXPECT_FALSE(Silent(audio.data, audio.data + 4000)) << c.what;
-        EXPECT_TRUE(Silent(audio.data + audio.dataBytes - 8192, audio.data + audio.dataBytes))
-            << c.what;
+        ASSERT_EQ(audio.dataBytes, samples * 2) << what;
+        EXPECT_FALSE(silent(audio.data, audio.data + 4000)) << what;
+        EXPECT_TRUE(silent(audio.data + audio.dataBytes - 8192, audio.data + audio.dataBytes))
+            << what;
     }
 }

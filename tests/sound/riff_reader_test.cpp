@@ -4,6 +4,7 @@
 
 #include <cstring>
 #include <gtest/gtest.h>
+#include <utility>
 
 using sound::DecodedAudio;
 using testing_support::Bytes;
@@ -77,11 +78,7 @@ TEST(RiffReader, RefusesFilesWithoutTheChunksOrTheFormatItNeeds)
     const Bytes pcm = FormatChunkBody(WaveSpec{});
     const Bytes extraBeyondTheChunk =
         FormatChunkBody(WaveSpec{.formatTag = 2, .extra = PatternBytes(10)});
-    const struct
-    {
-        const char* what;
-        Bytes file;
-    } cases[] = {
+    const std::pair<const char*, Bytes> cases[] = {
         {"no RIFF file", PatternBytes(100)},
         {"a RIFF form other than WAVE",
          RiffWriter().Chunk("fmt ", pcm).Chunk("data", PatternBytes(4)).Finish("AVI ")},
@@ -95,11 +92,10 @@ TEST(RiffReader, RefusesFilesWithoutTheChunksOrTheFormatItNeeds)
         {"no sample rate", Wave(FormatChunkBody({.sampleRate = 0}))},
         {"7 bits per sample", Wave(FormatChunkBody({.bitsPerSample = 7}))},
     };
-    for (const auto& c : cases)
+    for (const auto& [what, file] : cases)
     {
         DecodedAudio audio;
-        EXPECT_FALSE(sound::ReadWaveFromMemory(c.file.data(), c.file.size(), &audio)) << c.what;
-        EXPECT_EQ(audio.format, nullptr) << c.what;
-        EXPECT_EQ(audio.data, nullptr) << c.what;
+        EXPECT_FALSE(sound::ReadWaveFromMemory(file.data(), file.size(), &audio)) << what;
+        EXPECT_TRUE(audio.format == nullptr && audio.data == nullptr) << what;
     }
 }

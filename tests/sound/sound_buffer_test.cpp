@@ -10,11 +10,12 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <string>
+#include <tuple>
 
 using sound::CSoundBuffer;
 using sound::kCapsStatic;
 using testing_support::Bytes;
-using testing_support::WaveSpec;
+using testing_support::EncodeOggVorbis;
 
 namespace
 {
@@ -31,9 +32,7 @@ protected:
     }
     std::string WriteWave(const std::string& name, std::uint32_t dataBytes)
     {
-        WaveSpec fixture;
-        fixture.dataBytes = dataBytes;
-        return Write(name, testing_support::MakeWave(fixture));
+        return Write(name, testing_support::MakeWave({.dataBytes = dataBytes}));
     }
 
     testing_support::ScopedSoundDevice device_;
@@ -46,29 +45,19 @@ protected:
 // to 16-bit PCM.
 TEST_F(SoundBufferTest, TheLengthIsTheDataOverChannelsRateAndBytesPerSample)
 {
-    testing_support::OggFixture ogg;
-    ogg.sampleRate = 8000;
-    ogg.samplesPerChannel = 80000;
-    ogg.quality = -0.1f;
-    const std::string stereo = Write("STEREO.OGG", testing_support::EncodeOggVorbis(ogg));
-    ogg.channels = 1;
-    const std::string mono = Write("mono.ogg.bak", testing_support::EncodeOggVorbis(ogg));
-    const struct
-    {
-        std::string path;
-        float length;
-        sound::WaveFormat format;
-    } cases[] = {
+    const std::string stereo = Write("STEREO.OGG", EncodeOggVorbis({2, 8000, 80000, -0.1f})),
+                      mono = Write("mono.ogg.bak", EncodeOggVorbis({1, 8000, 80000, -0.1f}));
+    const std::tuple<std::string, float, sound::WaveFormat> cases[] = {
         {WriteWave("stereo.wav", 17640000), 100.0f, {1, 2, 44100, 176400, 4, 16, 0}},
         {stereo, 10.0f, {1, 2, 8000, 32000, 4, 16, 0}},
         {mono, 10.0f, {1, 1, 8000, 16000, 2, 16, 0}},
     };
-    for (const auto& c : cases)
+    for (const auto& [path, length, format] : cases)
     {
         CSoundBuffer buffer;
-        ASSERT_TRUE(buffer.Open(c.path.c_str(), 1, kCapsStatic)) << c.path;
-        EXPECT_EQ(buffer.GetLength(), c.length) << c.path;
-        EXPECT_EQ(std::memcmp(buffer.GetFormat(), &c.format, sizeof c.format), 0) << c.path;
+        ASSERT_TRUE(buffer.Open(path.c_str(), 1, kCapsStatic)) << path;
+        EXPECT_EQ(buffer.GetLength(), length) << path;
+        EXPECT_EQ(std::memcmp(buffer.GetFormat(), &format, sizeof format), 0) << path;
     }
 }
 
@@ -76,7 +65,7 @@ TEST_F(SoundBufferTest, WhatCannotBeDecodedOrBufferedDoesNotOpen)
 {
     std::filesystem::create_directory(folder_.File("folder.wav"));
     std::filesystem::create_directory(folder_.File("folder.ogg"));
-    const std::string ogg = Write("track.Ogg", testing_support::EncodeOggVorbis({})); // a wave
+    const std::string ogg = Write("track.Ogg", EncodeOggVorbis({})); // a wave
     for (const std::string& path :
          {folder_.File("missing.wav"), folder_.File("missing.ogg"), folder_.File("folder.wav"),
           folder_.File("folder.ogg"), Write("empty.wav", {}), ogg,
@@ -139,7 +128,7 @@ TEST_F(SoundBufferTest, ABufferIsReleasedTwiceAndOpenedAgainEvenFromItsOwnName)
 TEST_F(SoundBufferTest, AnyAllocationFailureFailsCleanly)
 {
     for (const std::string& path :
-         {WriteWave("alloc.wav", 4000), Write("alloc.ogg", testing_support::EncodeOggVorbis({}))})
+         {WriteWave("alloc.wav", 4000), Write("alloc.ogg", EncodeOggVorbis({}))})
     {
         bool opened = false;
         for (int successes = 0; successes < 40 && !opened; ++successes)

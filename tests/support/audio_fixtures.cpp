@@ -1,7 +1,7 @@
 #include "tests/support/audio_fixtures.h"
 
+#include <algorithm>
 #include <cmath>
-#include <cstring>
 #include <stdexcept>
 #include <vorbis/vorbisenc.h>
 
@@ -22,12 +22,6 @@ void PutU32(Bytes& out, std::uint32_t value)
     PutU16(out, value >> 16);
 }
 
-void PutId(Bytes& out, const char* id)
-{
-    for (int i = 0; i < 4; ++i)
-        out.push_back(static_cast<std::uint8_t>(id[i]));
-}
-
 void Append(Bytes& out, const ogg_page& page)
 {
     out.insert(out.end(), page.header, page.header + page.header_len);
@@ -43,7 +37,7 @@ RiffWriter& RiffWriter::Chunk(const char* id, const Bytes& body)
 
 RiffWriter& RiffWriter::ChunkClaiming(const char* id, std::uint32_t claimedSize, const Bytes& body)
 {
-    PutId(chunks_, id);
+    chunks_.insert(chunks_.end(), id, id + 4);
     PutU32(chunks_, claimedSize);
     chunks_.insert(chunks_.end(), body.begin(), body.end());
     if (body.size() % 2 != 0)
@@ -53,10 +47,9 @@ RiffWriter& RiffWriter::ChunkClaiming(const char* id, std::uint32_t claimedSize,
 
 Bytes RiffWriter::Finish(const char* form) const
 {
-    Bytes out;
-    PutId(out, "RIFF");
+    Bytes out{'R', 'I', 'F', 'F'};
     PutU32(out, static_cast<std::uint32_t>(4 + chunks_.size()));
-    PutId(out, form);
+    out.insert(out.end(), form, form + 4);
     out.insert(out.end(), chunks_.begin(), chunks_.end());
     return out;
 }
@@ -97,37 +90,10 @@ Bytes MakeWave(const WaveSpec& fixture)
 
 Bytes MakeWaveOfLength(double seconds)
 {
-    WaveSpec fixture;
-    fixture.channels = 1;
-    fixture.sampleRate = 1000;
-    fixture.bitsPerSample = 8;
-    fixture.dataBytes = static_cast<std::uint32_t>(std::llround(seconds * 1000.0));
-    return MakeWave(fixture);
-}
-
-SampleSource TuneSource(long sampleRate)
-{
-    return [sampleRate](float** channels, int channelCount, int count, std::uint64_t first)
-    {
-        constexpr double kTwoPi = 6.283185307179586;
-        for (int i = 0; i < count; ++i)
-        {
-            const double t = double(first + i) / double(sampleRate);
-            // A melody of three voices whose notes change every quarter second.
-            const int step = static_cast<int>(t * 4.0);
-            const double root = 220.0 * std::pow(2.0, ((step * 5) % 12) / 12.0);
-            const double value = 0.25 * std::sin(kTwoPi * root * t) +
-                                 0.15 * std::sin(kTwoPi * root * 1.5 * t) +
-                                 0.10 * std::sin(kTwoPi * root * 2.01 * t);
-            for (int c = 0; c < channelCount; ++c)
-                channels[c][i] = static_cast<float>(value * (c % 2 == 0 ? 1.0 : 0.8));
-        }
-    };
-}
-
-Bytes EncodeOggVorbis(const OggFixture& fixture)
-{
-    return EncodeOggVorbis(fixture, TuneSource(fixture.sampleRate));
+    return MakeWave({.channels = 1,
+                     .sampleRate = 1000,
+                     .bitsPerSample = 8,
+                     .dataBytes = static_cast<std::uint32_t>(std::llround(seconds * 1000.0))});
 }
 
 Bytes EncodeOggVorbis(const OggFixture& fixture, const SampleSource& source)
@@ -135,10 +101,7 @@ Bytes EncodeOggVorbis(const OggFixture& fixture, const SampleSource& source)
     vorbis_info info;
     vorbis_info_init(&info);
     if (vorbis_encode_init_vbr(&info, fixture.channels, fixture.sampleRate, fixture.quality) != 0)
-    {
-        vorbis_info_clear(&info);
         throw std::runtime_error("libvorbisenc refused the encoder settings");
-    }
     vorbis_comment comment;
     vorbis_comment_init(&comment);
     vorbis_dsp_state dsp;
@@ -147,35 +110,24 @@ Bytes EncodeOggVorbis(const OggFixture& fixture, const SampleSource& source)
     vorbis_block_init(&dsp, &block);
     ogg_stream_state stream;
     ogg_stream_init(&stream, 0x56454B);
-
     Bytes out;
-    ogg_packet header, commentHeader, codeHeader;
-    vorbis_analysis_headerout(&dsp, &comment, &header, &commentHeader, &codeHeader);
-    ogg_stream_packetin(&stream, &header);
-    ogg_stream_packetin(&stream, &commentHeader);
-    ogg_stream_packetin(&stream, &codeHeader);
+    ogg_packet headers[3];
+    vorbis_analysis_headerout(&dsp, &comment, &headers[0], &headers[1], &headers[2]);
+    for (ogg_packet& header : headers)
+        ogg_stream_packetin(&stream, &header);
     ogg_page page;
     while (ogg_stream_flush(&stream, &page) != 0)
         Append(out, page);
-
-    constexpr int kBlock = 1024;
-    std::uint64_t written = 0;
-    bool ended = false;
-    while (!ended)
+    for (std::uint64_t written = 0, count = 1; count != 0; written += count)
     {
-        const std::uint64_t left = fixture.samplesPerChannel - written;
-        const int count = left < kBlock ? static_cast<int>(left) : kBlock;
-        if (count == 0)
-        {
-            vorbis_analysis_wrote(&dsp, 0);
-        }
-        else
-        {
-            float** buffer = vorbis_analysis_buffer(&dsp, count);
-            source(buffer, fixture.channels, count, written);
-            vorbis_analysis_wrote(&dsp, count);
-            written += count;
-        }
+        count = std::min<std::uint64_t>(fixture.samplesPerChannel - written, 1024);
+        float** buffer = count == 0 ? nullptr : vorbis_analysis_buffer(&dsp, int(count));
+        if (source != nullptr && count != 0)
+            source(buffer, fixture.channels, int(count), written);
+        for (std::uint64_t n = written; source == nullptr && n < written + count; ++n)
+            for (int c = 0; c < fixture.channels; ++c)
+                buffer[c][n - written] = float(0.3 * std::sin(1e-7 * double(n * n)));
+        vorbis_analysis_wrote(&dsp, int(count));
         while (vorbis_analysis_blockout(&dsp, &block) == 1)
         {
             vorbis_analysis(&block, nullptr);
@@ -185,51 +137,17 @@ Bytes EncodeOggVorbis(const OggFixture& fixture, const SampleSource& source)
             {
                 ogg_stream_packetin(&stream, &packet);
                 while (ogg_stream_pageout(&stream, &page) != 0)
-                {
                     Append(out, page);
-                    ended = ended || ogg_page_eos(&page) != 0;
-                }
             }
         }
-        if (count == 0)
-            ended = true;
     }
     while (ogg_stream_flush(&stream, &page) != 0)
         Append(out, page);
-
     ogg_stream_clear(&stream);
     vorbis_block_clear(&block);
     vorbis_dsp_clear(&dsp);
     vorbis_comment_clear(&comment);
     vorbis_info_clear(&info);
-    return out;
-}
-
-std::vector<Bytes> SplitOggPages(const Bytes& stream)
-{
-    std::vector<Bytes> pages;
-    std::size_t position = 0;
-    while (position + 27 <= stream.size() && std::memcmp(&stream[position], "OggS", 4) == 0)
-    {
-        const std::size_t segments = stream[position + 26];
-        std::size_t size = 27 + segments;
-        if (position + size > stream.size())
-            break;
-        for (std::size_t i = 0; i < segments; ++i)
-            size += stream[position + 27 + i];
-        if (position + size > stream.size())
-            break;
-        pages.emplace_back(stream.begin() + position, stream.begin() + position + size);
-        position += size;
-    }
-    return pages;
-}
-
-Bytes JoinOggPages(const std::vector<Bytes>& pages)
-{
-    Bytes out;
-    for (const Bytes& page : pages)
-        out.insert(out.end(), page.begin(), page.end());
     return out;
 }
 

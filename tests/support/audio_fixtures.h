@@ -2,25 +2,19 @@
 
 // Audio files made by the tests themselves: a RIFF writer and Ogg Vorbis
 // through libvorbisenc. Shared by the tests, the benchmark and fuzzing.
-#include <cstddef>
-#include <cstdint>
+#include "tests/support/ogg_pages.h"
+
 #include <functional>
-#include <string>
-#include <vector>
 
 namespace testing_support
 {
-
-using Bytes = std::vector<std::uint8_t>;
 
 // A RIFF file built chunk by chunk; every chunk is padded to an even size.
 class RiffWriter
 {
 public:
-    // A chunk whose size field is the body's size.
     RiffWriter& Chunk(const char* id, const Bytes& body);
-    // A chunk whose size field claims `claimedSize` whatever the body holds
-    // (a truncated data chunk, for one).
+    // A chunk whose size field claims `claimedSize` whatever the body holds.
     RiffWriter& ChunkClaiming(const char* id, std::uint32_t claimedSize, const Bytes& body);
     // "RIFF", the size of what follows, the form type and the chunks.
     Bytes Finish(const char* form = "WAVE") const;
@@ -46,8 +40,7 @@ Bytes FormatChunkBody(const WaveSpec& fixture);
 Bytes PatternBytes(std::size_t size);
 // A whole wave file: "fmt " and a "data" chunk of fixture.dataBytes pattern bytes.
 Bytes MakeWave(const WaveSpec& fixture);
-// A wave of `seconds` of 8-bit mono at 1000 Hz: small and exact, for tests
-// that need music of a given length.
+// A wave of `seconds` of 8-bit mono at 1000 Hz, for music of a given length.
 Bytes MakeWaveOfLength(double seconds);
 
 struct OggFixture
@@ -63,15 +56,8 @@ struct OggFixture
 using SampleSource =
     std::function<void(float** channels, int channelCount, int count, std::uint64_t first)>;
 
-// A tune: a few tones that move, so that the encoder has real work.
-SampleSource TuneSource(long sampleRate);
-
-// Encodes exactly fixture.samplesPerChannel samples per channel.
-Bytes EncodeOggVorbis(const OggFixture& fixture, const SampleSource& source);
-Bytes EncodeOggVorbis(const OggFixture& fixture);
-
-// The pages of an Ogg stream, each a complete page with its header.
-std::vector<Bytes> SplitOggPages(const Bytes& stream);
-Bytes JoinOggPages(const std::vector<Bytes>& pages);
+// Encodes exactly fixture.samplesPerChannel samples per channel of
+// `source`, or by default of a rising tone.
+Bytes EncodeOggVorbis(const OggFixture& fixture, const SampleSource& source = nullptr);
 
 } // namespace testing_support

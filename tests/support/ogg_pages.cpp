@@ -17,26 +17,9 @@ std::size_t PageSize(const std::uint8_t* data, std::size_t size)
         return 0;
     const std::size_t segments = data[26];
     std::size_t total = kHeaderBytes + segments;
-    if (total > size)
-        return 0;
-    for (std::size_t i = 0; i < segments; ++i)
+    for (std::size_t i = 0; i < segments && total <= size; ++i)
         total += data[kHeaderBytes + i];
     return total <= size ? total : 0;
-}
-
-// CRC-32 with the polynomial 0x04C11DB7, not reflected, starting from 0,
-// over the page with its checksum field zero.
-std::uint32_t OggPageChecksum(const std::uint8_t* page, std::size_t size)
-{
-    std::uint32_t crc = 0;
-    for (std::size_t i = 0; i < size; ++i)
-    {
-        const bool inChecksum = i >= kChecksumOffset && i < kChecksumOffset + 4;
-        crc ^= std::uint32_t(inChecksum ? 0 : page[i]) << 24;
-        for (int bit = 0; bit < 8; ++bit)
-            crc = (crc & 0x80000000u) != 0 ? (crc << 1) ^ 0x04C11DB7u : crc << 1;
-    }
-    return crc;
 }
 
 } // namespace
@@ -44,22 +27,44 @@ std::uint32_t OggPageChecksum(const std::uint8_t* page, std::size_t size)
 std::size_t RepairOggChecksums(std::uint8_t* data, std::size_t size)
 {
     std::size_t repaired = 0;
-    std::size_t position = 0;
-    while (position < size)
+    for (std::size_t position = 0, page; position < size; position += page == 0 ? 1 : page)
     {
-        const std::size_t page = PageSize(data + position, size - position);
+        page = PageSize(data + position, size - position);
         if (page == 0)
-        {
-            ++position;
             continue;
+        std::uint8_t* checksum = data + position + kChecksumOffset;
+        // CRC-32 with the polynomial 0x04C11DB7, not reflected, starting from
+        // 0, over the page with its checksum field zero.
+        std::memset(checksum, 0, 4);
+        std::uint32_t crc = 0;
+        for (std::size_t i = 0; i < page; ++i)
+        {
+            crc ^= std::uint32_t(data[position + i]) << 24;
+            for (int bit = 0; bit < 8; ++bit)
+                crc = (crc & 0x80000000u) != 0 ? (crc << 1) ^ 0x04C11DB7u : crc << 1;
         }
-        const std::uint32_t crc = OggPageChecksum(data + position, page);
         for (int i = 0; i < 4; ++i)
-            data[position + kChecksumOffset + i] = static_cast<std::uint8_t>(crc >> (8 * i));
+            checksum[i] = static_cast<std::uint8_t>(crc >> (8 * i));
         ++repaired;
-        position += page;
     }
     return repaired;
+}
+
+std::vector<Bytes> SplitOggPages(const Bytes& stream)
+{
+    std::vector<Bytes> pages;
+    for (std::size_t at = 0, size; (size = PageSize(stream.data() + at, stream.size() - at)) != 0;
+         at += size)
+        pages.emplace_back(stream.begin() + at, stream.begin() + at + size);
+    return pages;
+}
+
+Bytes JoinOggPages(const std::vector<Bytes>& pages)
+{
+    Bytes out;
+    for (const Bytes& page : pages)
+        out.insert(out.end(), page.begin(), page.end());
+    return out;
 }
 
 } // namespace testing_support

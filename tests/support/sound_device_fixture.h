@@ -13,15 +13,11 @@ void* TestWindowHandle();
 class ScopedSoundDevice
 {
 public:
-    ScopedSoundDevice();
-    ScopedSoundDevice(const ScopedSoundDevice&) = delete;
-    ScopedSoundDevice& operator=(const ScopedSoundDevice&) = delete;
-
     bool Ready() const { return ready_; }
 
 private:
     sound::CSound device_;
-    bool ready_;
+    bool ready_ = device_.Init(TestWindowHandle());
 };
 
 } // namespace testing_support

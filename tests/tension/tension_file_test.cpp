@@ -71,9 +71,7 @@ struct Row
     double seconds;
     std::string text;
     bool accepted;
-    // Without the "Time Data IsCorrect Error!!" that ends every refusal
-    // with a message.
-    std::string log;
+    std::string log;                // without the kIsCorrect that ends a refusal with a message
     const char* timeline = nullptr; // null: not looked at
 };
 
@@ -106,18 +104,6 @@ std::string Segments(const char* levels)
         text += std::string(1, levels[i]) + "T:" + std::to_string(10 + i) + ";\n";
     return text;
 }
-
-// Files named relative to a fresh working folder, so that a path that
-// stands in for a missing name is short on every platform.
-class TensionLoad : public ::testing::Test
-{
-protected:
-    void SetUp() override { std::filesystem::current_path(folder_.Path()); }
-    void TearDown() override { std::filesystem::current_path(previous_); }
-
-    testing_support::TempFolder folder_;
-    std::filesystem::path previous_ = std::filesystem::current_path();
-};
 
 } // namespace
 
@@ -254,8 +240,13 @@ TEST(TensionQuery, TheGameAsksACopyForTheLevelAndTheFinaleAtATime)
     EXPECT_EQ(copy.GetTension(215.0f), TensionLevel::Low) << "folded to 60 + 35 s";
 }
 
-TEST_F(TensionLoad, FilesAreReadInTextModeAndNamedByTheirPathUntilAnEntryNamesThem)
+TEST(TensionLoad, FilesAreReadInTextModeAndNamedByTheirPathUntilAnEntryNamesThem)
 {
+    // Files named relative to a fresh working folder, so that a path that
+    // stands in for a missing name is short on every platform.
+    const testing_support::TempFolder folder;
+    const std::filesystem::path previous = std::filesystem::current_path();
+    std::filesystem::current_path(folder.Path());
     std::filesystem::create_directory("folder");
     const std::string longPath = std::string(37, 'p') + ".txt";
     // The path, the text written (null: none), whether it loads, the log and the name.
@@ -276,14 +267,16 @@ TEST_F(TensionLoad, FilesAreReadInTextModeAndNamedByTheirPathUntilAnEntryNamesTh
         EXPECT_EQ(log.CStr(), shown) << path;
         EXPECT_EQ(file.GetName().CStr(), name) << path;
     }
-    CTensionFile file;
-    ASSERT_TRUE(file.LoadFromFile(Music(180), "crlf.txt", nullptr));
+    CTensionFile file, unread;
+    EXPECT_TRUE(file.LoadFromFile(Music(180), "crlf.txt", nullptr));
     EXPECT_STREQ(file.GetComment().CStr(), "one\ntwo");
     EXPECT_EQ(Timeline(file), "0N 30L 180N");
-    CTensionFile unread;
-    base::ScopedAllocationFailure failure(1); // the name's copy succeeds, the text's not
-    EXPECT_FALSE(unread.LoadFromFile(Music(180), "crlf.txt", nullptr));
+    {
+        base::ScopedAllocationFailure failure(1); // the name's copy succeeds, the text's not
+        EXPECT_FALSE(unread.LoadFromFile(Music(180), "crlf.txt", nullptr));
+    }
     EXPECT_EQ(unread.GetTimeline(), nullptr);
+    std::filesystem::current_path(previous);
 }
 
 TEST(TensionArchive, AnEntryIsLoadedByItsExactNameFromTheFirstArchiveThatLoadsIt)
