@@ -61,18 +61,9 @@ constexpr GUID kAmbisonicPcmSubFormat{
 
 } // namespace
 
-// What IDirectSound8::CreateSoundBuffer answers for the static buffer of a
-// check, measured under Wine, and what the POSIX stand-in answers through
-// IsPlayableFormat: the same, row by row. Windows documents part of it:
-// compressed formats only in hardware buffers, which the check never asks
-// for; block align = channels x bytes per sample; whole-byte containers, at
-// least 22 extra bytes and no more valid bits than bits for the extensible
-// format. Where it only says "should" (bytes per second = rate x block
-// align), or speaks of SetFrequency rather than of a format
-// (DSBFREQUENCY_MIN and _MAX), Wine refuses nothing and the stand-in
-// neither. Pages for pre-WDM drivers limit software buffers to 8 and 16
-// bits; those for WDM drivers take wider, float and multichannel formats,
-// as Wine does.
+// What CreateSoundBuffer answers for a check's static buffer, measured under
+// Wine, and what the POSIX stand-in answers: the same, row by row (what
+// Windows documents of it: docs/reliability.md).
 TEST(DirectSoundFormats, TheStandInRefusesExactlyWhatDirectSoundRefuses)
 {
     struct Row
