@@ -7,11 +7,11 @@
 // Usage: make_differential_corpus <folder>
 #include "config/save_config.h"
 #include "tests/support/audio_fixtures.h"
+#include "tests/support/temp_folder.h"
 
 #include <cstring>
 #include <filesystem>
 #include <fstream>
-#include <stdexcept>
 #include <string>
 #include <utility>
 #include <vector>
@@ -22,27 +22,17 @@ namespace
 namespace fs = std::filesystem;
 using testing_support::Bytes;
 
-class Corpus
+// The corpus folder, and the commands to run on it.
+struct Corpus
 {
-public:
-    explicit Corpus(fs::path folder) : folder_(std::move(folder)), cases_(folder_ / "cases.txt") {}
+    fs::path folder;
+    std::ofstream cases{folder / "cases.txt"};
 
-    void Write(const std::string& name, const Bytes& bytes) const
+    template <typename Range> void Write(const std::string& name, const Range& bytes) const
     {
-        std::ofstream out(folder_ / name, std::ios::binary);
-        out.write(reinterpret_cast<const char*>(bytes.data()), std::streamsize(bytes.size()));
-        if (!out)
-            throw std::runtime_error("cannot write " + name);
+        testing_support::WriteBytes((folder / name).string(), {bytes.begin(), bytes.end()});
     }
-    void Write(const std::string& name, const std::string& text) const
-    {
-        Write(name, Bytes(text.begin(), text.end()));
-    }
-    void Case(const std::string& command) { cases_ << command << '\n'; }
-
-private:
-    fs::path folder_;
-    std::ofstream cases_;
+    void Case(const std::string& command) { cases << command << '\n'; }
 };
 
 std::string CrLf(const std::string& text)
@@ -185,7 +175,7 @@ int main(int argc, char** argv)
         return 2;
     const fs::path folder = argv[1];
     fs::create_directories(folder);
-    Corpus corpus(folder);
+    Corpus corpus{folder};
     TensionFiles(corpus);
     MusicFiles(corpus);
     SettingsFiles(corpus);
