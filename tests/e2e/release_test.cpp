@@ -1,6 +1,5 @@
-// The release archive as a player gets it, unpacked into a new folder (named
-// by VEK_RELEASE_DIR): the tool starts from there and saves, and both
-// programs carry the build's version in their version resources.
+// The archive unpacked into a new folder (VEK_RELEASE_DIR): the tool starts
+// from there and saves; both programs carry the build's version.
 #include "config/save_config.h"
 #include "tests/e2e/tool_driver.h"
 #include "tests/support/temp_folder.h"

@@ -1,5 +1,6 @@
-// vekcfg.exe changes the tool's own file, found from TEMP as the tool finds
-// it, and the tool shows the value on its page.
+// vekcfg.exe without FILE changes the tool's own file (found from TEMP as the
+// tool finds it), and the tool, whose pages are filled after it shows, shows
+// the value.
 #include "config/save_config.h"
 #include "resources/resource.h"
 #include "tests/e2e/tool_driver.h"
@@ -14,19 +15,11 @@ TEST(Vekcfg, AValueSetOnTheCommandLineShowsOnTheToolsPage)
     config::CSaveConfig record;
     record.ResetAll();
     testing_support::WriteBytes(folder.SettingsFile(), record.SaveToBytes());
-    // No FILE: on Windows it is the tool's own.
     ASSERT_EQ(e2e::ToolProcess("vekcfg.exe", "set graphics.screenSize=1280x960").ExitCode(), 0u);
 
     e2e::ToolProcess tool;
     const HWND dialog = tool.MainDialog();
     ASSERT_NE(dialog, nullptr);
-    // The dialog shows before its pages are filled.
-    std::string seen;
     EXPECT_TRUE(e2e::WaitFor(
-        [&]
-        {
-            seen = e2e::WindowText(e2e::FindControl(dialog, IDC_SCREEN_SIZE));
-            return seen == "1280×960";
-        }))
-        << seen;
+        [&] { return e2e::WindowText(e2e::FindControl(dialog, IDC_SCREEN_SIZE)) == "1280×960"; }));
 }
