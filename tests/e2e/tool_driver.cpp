@@ -63,14 +63,15 @@ ToolProcess::~ToolProcess()
     CloseHandle(process_.hProcess);
 }
 
-HWND ToolProcess::FindDialog(bool messageBox)
+HWND ToolProcess::FindDialog(bool (*matches)(HWND dialog, int id), int id)
 {
     struct Search
     {
         DWORD processId;
-        bool messageBox;
+        bool (*matches)(HWND, int);
+        int id;
         HWND found;
-    } search{process_.dwProcessId, messageBox, nullptr};
+    } search{process_.dwProcessId, matches, id, nullptr};
     WaitFor(
         [&]
         {
@@ -83,10 +84,9 @@ HWND ToolProcess::FindDialog(bool messageBox)
                     GetWindowThreadProcessId(window, &processId);
                     GetClassNameA(window, className, sizeof className);
                     if (processId == s->processId && IsWindowVisible(window) &&
-                        std::strcmp(className, "#32770") == 0 &&
-                        (GetDlgItem(window, 0xFFFF) != nullptr) == s->messageBox)
+                        std::strcmp(className, "#32770") == 0 && s->matches(window, s->id))
                         s->found = window;
-                    return TRUE;
+                    return s->found == nullptr;
                 },
                 reinterpret_cast<LPARAM>(&search));
             return search.found != nullptr;
@@ -96,12 +96,23 @@ HWND ToolProcess::FindDialog(bool messageBox)
 
 HWND ToolProcess::MainDialog()
 {
-    return FindDialog(false);
+    return FindDialog([](HWND dialog, int) { return GetDlgItem(dialog, 0xFFFF) == nullptr; });
+}
+
+HWND ToolProcess::DialogWith(int id)
+{
+    return FindDialog([](HWND dialog, int id) { return GetDlgItem(dialog, id) != nullptr; }, id);
 }
 
 MessageBoxSeen ToolProcess::AnswerMessageBox(int answer)
 {
-    const HWND box = FindDialog(true);
+    // A text of id 0xFFFF and no edit: the IP entry dialog's labels share the id.
+    const HWND box = FindDialog(
+        [](HWND dialog, int)
+        {
+            return GetDlgItem(dialog, 0xFFFF) != nullptr &&
+                   FindWindowExA(dialog, nullptr, "Edit", nullptr) == nullptr;
+        });
     if (box == nullptr)
         return {"(no message box)", "", nullptr};
     MessageBoxSeen seen{WindowText(box), WindowText(GetDlgItem(box, 0xFFFF)),

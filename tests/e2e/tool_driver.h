@@ -45,15 +45,16 @@ public:
 
     // The main dialog once it is shown; null after the timeout.
     HWND MainDialog();
+    // A shown dialog of the tool holding a control of id `id`.
+    HWND DialogWith(int id);
     // Reads the next message box the tool shows and presses `answer` in it.
     MessageBoxSeen AnswerMessageBox(int answer);
     // The exit code once the process has ended, else STILL_ACTIVE.
     DWORD ExitCode(DWORD timeoutMs = 10000);
 
 private:
-    // A shown dialog of the tool: a message box (with a text of id 0xFFFF)
-    // or the main dialog.
-    HWND FindDialog(bool messageBox);
+    // A shown dialog of the tool that `matches`; null after the timeout.
+    HWND FindDialog(bool (*matches)(HWND dialog, int id), int id = 0);
 
     PROCESS_INFORMATION process_{};
 };
