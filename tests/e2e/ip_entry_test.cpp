@@ -1,12 +1,52 @@
 // The IP entry dialog as a user meets it: an add button pressed, a field out
 // of range refused with its box and the dialog kept, the address then added;
 // a line selected and deleted; the lists saved.
+#include "config/ip_address.h"
 #include "config/save_config.h"
 #include "resources/resource.h"
 #include "tests/e2e/tool_driver.h"
 #include "tests/support/temp_folder.h"
 
+#include <array>
 #include <gtest/gtest.h>
+
+namespace
+{
+
+// Types an address into the IP entry dialog and presses OK.
+void Type(HWND entry, std::array<const char*, 4> octets)
+{
+    for (const int id : {IDC_IP_OCTET1, IDC_IP_OCTET2, IDC_IP_OCTET3, IDC_IP_OCTET4})
+        SendDlgItemMessageA(entry, id, WM_SETTEXT, 0,
+                            reinterpret_cast<LPARAM>(octets[id - IDC_IP_OCTET1]));
+    e2e::PostCommand(entry, IDOK);
+}
+
+// Presses an add button and enters an address; the dialog, once closed.
+HWND Enter(e2e::ToolProcess& tool, HWND dialog, int add, std::array<const char*, 4> octets)
+{
+    PostMessageA(e2e::FindControl(dialog, add), BM_CLICK, 0, 0);
+    const HWND entry = tool.DialogWith(IDC_IP_OCTET1);
+    Type(entry, octets);
+    return entry;
+}
+
+void Press(HWND dialog, int button)
+{
+    PostMessageA(e2e::FindControl(dialog, button), BM_CLICK, 0, 0);
+}
+
+config::CSaveConfig SaveAndClose(e2e::ToolProcess& tool, HWND dialog, const std::string& file)
+{
+    e2e::PostCommand(dialog, IDOK);
+    EXPECT_EQ(tool.AnswerMessageBox(IDYES).caption, "終了確認");
+    EXPECT_EQ(tool.ExitCode(), 0u);
+    config::CSaveConfig saved;
+    EXPECT_TRUE(saved.LoadFromPath(file.c_str()));
+    return saved;
+}
+
+} // namespace
 
 TEST(IpEntry, ARefusedFieldKeepsTheDialogOkAddsTheAddressAndDeleteRemovesIt)
 {
@@ -14,35 +54,55 @@ TEST(IpEntry, ARefusedFieldKeepsTheDialogOkAddsTheAddressAndDeleteRemovesIt)
     e2e::ToolProcess tool;
     const HWND dialog = tool.MainDialog();
     ASSERT_TRUE(e2e::WaitFor([&] { return e2e::FindControl(dialog, IDC_DENY_DELETE) != nullptr; }));
-    HWND entry = nullptr;
-    const auto type = [&](const char* first)
-    {
-        for (const int id : {IDC_IP_OCTET2, IDC_IP_OCTET3, IDC_IP_OCTET4})
-            SendDlgItemMessageA(entry, id, WM_SETTEXT, 0, reinterpret_cast<LPARAM>("7"));
-        SendDlgItemMessageA(entry, IDC_IP_OCTET1, WM_SETTEXT, 0, reinterpret_cast<LPARAM>(first));
-        e2e::PostCommand(entry, IDOK);
-    };
     for (const int add : {IDC_ALLOW_ADD, IDC_DENY_ADD})
     {
-        PostMessageA(e2e::FindControl(dialog, add), BM_CLICK, 0, 0);
-        ASSERT_NE(entry = tool.DialogWith(IDC_IP_OCTET1), nullptr);
-        type("256");
+        const HWND entry = Enter(tool, dialog, add, {"256", "7", "7", "7"});
         const e2e::MessageBoxSeen refusal = tool.AnswerMessageBox(IDOK);
         EXPECT_EQ(refusal.caption + ": " + refusal.text,
                   "Error: IPアドレスには0～255までの数字を入力してください。");
-        type("*");
+        Type(entry, {"*", "7", "7", "7"});
         EXPECT_TRUE(e2e::WaitFor([&] { return !IsWindow(entry); }));
     }
     SendMessageA(e2e::FindControl(dialog, IDC_DENY_LIST), LB_SETCURSEL, 0, 0);
-    PostMessageA(e2e::FindControl(dialog, IDC_DENY_DELETE), BM_CLICK, 0, 0);
+    Press(dialog, IDC_DENY_DELETE);
 
-    e2e::PostCommand(dialog, IDOK);
-    EXPECT_EQ(tool.AnswerMessageBox(IDYES).caption, "終了確認");
-    EXPECT_EQ(tool.ExitCode(), 0u);
-    config::CSaveConfig saved;
-    ASSERT_TRUE(saved.LoadFromPath(folder.SettingsFile().c_str()));
+    const config::CSaveConfig saved = SaveAndClose(tool, dialog, folder.SettingsFile());
     ASSERT_EQ(saved.Network()->allowCount, 1u);
-    EXPECT_EQ(std::string(saved.GetAllowEntry(0)->octets[0]) + saved.GetAllowEntry(0)->octets[3],
-              "*007");
+    EXPECT_EQ(config::ListedLine(*saved.GetAllowEntry(0)), "*.007.007.007");
     EXPECT_EQ(saved.Network()->denyCount, 0u);
+}
+
+// A file written with free 接続 slots between filled ones: each line still
+// deletes its own slot; an all-zero address is listed but leaves its slot
+// free for the next.
+TEST(IpEntry, ConnectLinesStayWithTheirSlotsInAFileWithFreeSlotsBetween)
+{
+    testing_support::TempSaveFolder folder;
+    config::CSaveConfig record;
+    record.ResetAll();
+    record.Network()->connectList[1] = {{"001", "001", "001", "001"}};
+    record.Network()->connectList[3] = {{"003", "003", "003", "003"}};
+    std::filesystem::create_directories(folder.SaveDirectory());
+    testing_support::WriteBytes(folder.SettingsFile(), record.SaveToBytes());
+    e2e::ToolProcess tool;
+    const HWND dialog = tool.MainDialog();
+    HWND list = nullptr;
+    ASSERT_TRUE(e2e::WaitFor([&] { return (list = e2e::FindControl(dialog, IDC_CONNECT_LIST)); }));
+    const auto lines = [&] { return SendMessageA(list, LB_GETCOUNT, 0, 0); };
+
+    const HWND entry = Enter(tool, dialog, IDC_CONNECT_ADD, {"9", "9", "9", "9"});
+    ASSERT_TRUE(e2e::WaitFor([&] { return !IsWindow(entry) && lines() == 3; }));
+    SendMessageA(list, LB_SETCURSEL, 2, 0); // 3.3.3.3
+    Press(dialog, IDC_CONNECT_DELETE);
+    ASSERT_TRUE(e2e::WaitFor([&] { return lines() == 2; }));
+    Enter(tool, dialog, IDC_CONNECT_ADD, {"0", "0", "0", "0"});
+    ASSERT_TRUE(e2e::WaitFor([&] { return lines() == 3; }));
+    const HWND last = Enter(tool, dialog, IDC_CONNECT_ADD, {"5", "5", "5", "5"});
+    ASSERT_TRUE(e2e::WaitFor([&] { return !IsWindow(last); }));
+
+    const config::CSaveConfig saved = SaveAndClose(tool, dialog, folder.SettingsFile());
+    const config::IpEntry* slots = saved.Network()->connectList;
+    EXPECT_EQ(config::ConnectLine(slots[0]) + " " + config::ConnectLine(slots[1]) + " " +
+                  config::ConnectLine(slots[2]) + " " + config::ConnectLine(slots[3]),
+              "9.9.9.9 1.1.1.1 5.5.5.5 0.0.0.0");
 }
