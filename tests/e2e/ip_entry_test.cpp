@@ -31,11 +31,6 @@ HWND Enter(e2e::ToolProcess& tool, HWND dialog, int add, std::array<const char*,
     return entry;
 }
 
-void Press(HWND dialog, int button)
-{
-    PostMessageA(e2e::FindControl(dialog, button), BM_CLICK, 0, 0);
-}
-
 config::CSaveConfig SaveAndClose(e2e::ToolProcess& tool, HWND dialog, const std::string& file)
 {
     e2e::PostCommand(dialog, IDOK);
@@ -64,7 +59,7 @@ TEST(IpEntry, ARefusedFieldKeepsTheDialogOkAddsTheAddressAndDeleteRemovesIt)
         EXPECT_TRUE(e2e::WaitFor([&] { return !IsWindow(entry); }));
     }
     SendMessageA(e2e::FindControl(dialog, IDC_DENY_LIST), LB_SETCURSEL, 0, 0);
-    Press(dialog, IDC_DENY_DELETE);
+    PostMessageA(e2e::FindControl(dialog, IDC_DENY_DELETE), BM_CLICK, 0, 0);
 
     const config::CSaveConfig saved = SaveAndClose(tool, dialog, folder.SettingsFile());
     ASSERT_EQ(saved.Network()->allowCount, 1u);
@@ -93,7 +88,7 @@ TEST(IpEntry, ConnectLinesStayWithTheirSlotsInAFileWithFreeSlotsBetween)
     const HWND entry = Enter(tool, dialog, IDC_CONNECT_ADD, {"9", "9", "9", "9"});
     ASSERT_TRUE(e2e::WaitFor([&] { return !IsWindow(entry) && lines() == 3; }));
     SendMessageA(list, LB_SETCURSEL, 2, 0); // 3.3.3.3
-    Press(dialog, IDC_CONNECT_DELETE);
+    PostMessageA(e2e::FindControl(dialog, IDC_CONNECT_DELETE), BM_CLICK, 0, 0);
     ASSERT_TRUE(e2e::WaitFor([&] { return lines() == 2; }));
     Enter(tool, dialog, IDC_CONNECT_ADD, {"0", "0", "0", "0"});
     ASSERT_TRUE(e2e::WaitFor([&] { return lines() == 3; }));
