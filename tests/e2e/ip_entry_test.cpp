@@ -22,7 +22,7 @@ void Type(HWND entry, std::array<const char*, 4> octets)
     e2e::PostCommand(entry, IDOK);
 }
 
-// Presses an add button and enters an address; the dialog, once closed.
+// Presses an add button and enters an address; returns the entry dialog.
 HWND Enter(e2e::ToolProcess& tool, HWND dialog, int add, std::array<const char*, 4> octets)
 {
     PostMessageA(e2e::FindControl(dialog, add), BM_CLICK, 0, 0);
