@@ -91,7 +91,7 @@ void MusicFiles(Corpus& corpus)
     const struct
     {
         const char* name;
-        WaveSpec spec;
+        WaveSpec wave;
     } formats[] = {
         {"pcm16-stereo.wav", {1, 2, 8000, 16, {}, 0}}, {"pcm12.wav", {1, 1, 8000, 12, {}, 0}},
         {"pcm24.wav", {1, 1, 8000, 24, {}, 0}},        {"pcm32.wav", {1, 1, 8000, 32, {}, 0}},
@@ -101,9 +101,9 @@ void MusicFiles(Corpus& corpus)
     };
     for (auto format : formats)
     {
-        format.spec.dataBytes = 180 * format.spec.sampleRate * format.spec.channels *
-                                ((format.spec.bitsPerSample + 7) / 8);
-        corpus.Write(format.name, MakeWave(format.spec));
+        format.wave.dataBytes = 180 * format.wave.sampleRate * format.wave.channels *
+                                ((format.wave.bitsPerSample + 7) / 8);
+        corpus.Write(format.name, MakeWave(format.wave));
     }
 
     // A block align that is not channels × bytes per sample.
@@ -120,12 +120,12 @@ void MusicFiles(Corpus& corpus)
     for (const auto& [name, subFormat] :
          {std::pair{"extensible-pcm.wav", 1}, {"extensible-adpcm.wav", 2}})
     {
-        WaveSpec spec{0xFFFE, 1, 8000, 16, {16, 0, 4, 0, 0, 0}, 180 * 8000 * 2};
+        WaveSpec extensible{0xFFFE, 1, 8000, 16, {16, 0, 4, 0, 0, 0}, 180 * 8000 * 2};
         const Bytes guidTail = {0, 0, 0, 0, 0x10, 0, 0x80, 0, 0, 0xAA, 0, 0x38, 0x9B, 0x71};
-        spec.extra.push_back(std::uint8_t(subFormat));
-        spec.extra.push_back(0);
-        spec.extra.insert(spec.extra.end(), guidTail.begin(), guidTail.end());
-        corpus.Write(name, MakeWave(spec));
+        extensible.extra.push_back(std::uint8_t(subFormat));
+        extensible.extra.push_back(0);
+        extensible.extra.insert(extensible.extra.end(), guidTail.begin(), guidTail.end());
+        corpus.Write(name, MakeWave(extensible));
     }
 
     testing_support::OggFixture ogg;
