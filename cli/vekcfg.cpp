@@ -36,6 +36,16 @@ void Complain(const std::string& utf8)
     WriteConsoleText(stderr, "vekcfg: " + utf8 + "\n");
 }
 
+// The device every decode of music goes through; its failure is reported.
+bool StartSoundDeviceOrComplain(sound::CSound& device)
+{
+    std::string reason;
+    if (StartSoundDevice(device, &reason))
+        return true;
+    Complain(reason);
+    return false;
+}
+
 int UsageError(const std::string& error)
 {
     Complain(error);
@@ -61,12 +71,8 @@ bool WriteWholeFile(const std::string& path, const std::string& bytes, std::stri
 int Check(const Invocation& invocation)
 {
     sound::CSound device;
-    std::string reason;
-    if (!StartSoundDevice(device, &reason))
-    {
-        Complain(reason);
+    if (!StartSoundDeviceOrComplain(device))
         return kExitTrouble;
-    }
     const CheckRun run = RunCheck(invocation.musicPath, invocation.tensionPath);
     std::string out = run.message;
     if (invocation.details)
@@ -122,12 +128,8 @@ int CheckConfig(const Invocation& invocation)
     if (!LoadSettings(invocation, record, &path, &version))
         return kExitTrouble;
     sound::CSound device;
-    std::string reason;
-    if (!StartSoundDevice(device, &reason))
-    {
-        Complain(reason);
+    if (!StartSoundDeviceOrComplain(device))
         return kExitTrouble;
-    }
     std::vector<RowCheck> rows;
     for (int row = 0; row < config::kUserBgmRowCount; ++row)
     {
@@ -264,12 +266,8 @@ std::string Cp932Name(const std::string& utf8)
 int Draft(const Invocation& invocation)
 {
     sound::CSound device;
-    std::string reason;
-    if (!StartSoundDevice(device, &reason))
-    {
-        Complain(reason);
+    if (!StartSoundDeviceOrComplain(device))
         return kExitTrouble;
-    }
     // The check's own decode gives the music's length, or the message the
     // check shows for music it cannot open.
     float length = 0.0f;
