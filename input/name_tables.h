@@ -17,11 +17,18 @@ inline constexpr std::size_t kPadButtonNameCount = 64;
 const char* KeyName(std::uint8_t code);
 const char* PadButtonName(std::uint8_t code);
 
+inline constexpr std::uint8_t kEscapeKey = 0x01;
+inline constexpr std::uint8_t kF1Key = 0x3B;
+inline constexpr std::uint8_t kF10Key = 0x44;
+inline constexpr std::uint8_t kF11Key = 0x57;
+inline constexpr std::uint8_t kF12Key = 0x58;
+
 // ESCAPE and the function keys F1 to F12 keep their fixed meanings in the
 // game: no action can have them.
 constexpr bool IsReservedKey(int code)
 {
-    return code == 0x01 || (code >= 0x3B && code <= 0x44) || code == 0x57 || code == 0x58;
+    return code == kEscapeKey || (code >= kF1Key && code <= kF10Key) || code == kF11Key ||
+           code == kF12Key;
 }
 
 } // namespace input
