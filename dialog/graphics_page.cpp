@@ -4,10 +4,6 @@
 #include "dialog/page_controls.h"
 #include "resources/resource.h"
 
-namespace
-{
-} // namespace
-
 bool CConfigApplication::InitGraphicsPage()
 {
     const HWND page = pages_[kGraphicsPageIndex].window;

@@ -7,11 +7,6 @@
 
 namespace dialog
 {
-namespace
-{
-// By action number.
-} // namespace
-
 void ShowActions(HWND page, int firstLabel, int firstEdit,
                  const std::uint32_t (&codes)[config::kActionCount], CodeName name)
 {
