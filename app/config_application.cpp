@@ -3,6 +3,7 @@
 #include "app/system.h"
 #include "input/input.h"
 #include "resources/resource.h"
+#include "sound/audio_warm_up_win32.h"
 #include "sound/sound_device.h"
 
 #include <commctrl.h>
@@ -49,6 +50,8 @@ CConfigApplication::~CConfigApplication()
 
 bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
 {
+    // The audio drivers load while the record is read and the dialog made.
+    sound::AudioWarmUp audioWarmUp;
     record_ = new (std::nothrow) config::CSaveConfig();
     if (record_ == nullptr)
         return false;
@@ -70,6 +73,7 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
         return false;
     procedure_ = procedure;
 
+    audioWarmUp.Wait();
     sound_ = new (std::nothrow) sound::CSound();
     if (sound_ == nullptr || !sound_->Init(system_->GetHwnd()))
         return false;
