@@ -36,11 +36,12 @@ bool CConfigApplication::InitGamePage()
     const LPARAM range = MAKELPARAM(static_cast<WORD>(config::kSliderMinimumVolume), 0);
     for (const VolumeSlider& slider : kVolumeSliders)
     {
-        SendDlgItemMessageA(page, slider.id, TBM_SETLINESIZE, 0, 10);
-        SendDlgItemMessageA(page, slider.id, TBM_SETRANGE, TRUE, range);
+        const HWND bar = GetDlgItem(page, slider.id);
+        SendMessageA(bar, TBM_SETLINESIZE, 0, 10);
+        SendMessageA(bar, TBM_SETRANGE, TRUE, range);
         // A stored silence (-10000) lies below the range and shows as its
         // left end; the field keeps it until a slider moves.
-        SendDlgItemMessageA(page, slider.id, TBM_SETPOS, TRUE, game->*slider.field);
+        SendMessageA(bar, TBM_SETPOS, TRUE, game->*slider.field);
     }
 
     dialog::FillChoices(page, IDC_RADAR_TYPE, config::kRadarTypeNames, game->radarType);

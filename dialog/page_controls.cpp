@@ -6,9 +6,11 @@ namespace
 {
 void Fill(HWND page, int id, std::span<const char* const> options, WPARAM selection)
 {
+    // Looked up once: under Wine every lookup is a call to its server.
+    const HWND list = GetDlgItem(page, id);
     for (const char* option : options)
-        SendDlgItemMessageA(page, id, CB_ADDSTRING, 0, reinterpret_cast<LPARAM>(option));
-    SendDlgItemMessageA(page, id, CB_SETCURSEL, selection, 0);
+        SendMessageA(list, CB_ADDSTRING, 0, reinterpret_cast<LPARAM>(option));
+    SendMessageA(list, CB_SETCURSEL, selection, 0);
 }
 
 LRESULT Selection(HWND page, int id)
