@@ -84,6 +84,8 @@ TEST(IpEntry, ConnectLinesStayWithTheirSlotsInAFileWithFreeSlotsBetween)
     HWND list = nullptr;
     ASSERT_TRUE(e2e::WaitFor([&] { return (list = e2e::FindControl(dialog, IDC_CONNECT_LIST)); }));
     const auto lines = [&] { return SendMessageA(list, LB_GETCOUNT, 0, 0); };
+    // The page is filled from the file before anything is clicked.
+    ASSERT_TRUE(e2e::WaitFor([&] { return lines() == 2; }));
 
     const HWND entry = Enter(tool, dialog, IDC_CONNECT_ADD, {"9", "9", "9", "9"});
     ASSERT_TRUE(e2e::WaitFor([&] { return !IsWindow(entry) && lines() == 3; }));
