@@ -65,18 +65,21 @@ const AddressList* ListDeletedBy(int button)
     return nullptr;
 }
 
-void AddLine(HWND page, int listBox, const std::string& line)
+// The list box is looked up once by its callers: under Wine every lookup is
+// a call to its server, and a list can hold 24 lines.
+void AddLine(HWND listBox, const std::string& line)
 {
-    SendDlgItemMessageA(page, listBox, LB_ADDSTRING, 0, reinterpret_cast<LPARAM>(line.c_str()));
+    SendMessageA(listBox, LB_ADDSTRING, 0, reinterpret_cast<LPARAM>(line.c_str()));
 }
 
 // The 接続 list shows the slots ListedConnectSlots names, and is filled anew
 // after each change, so that a line always stands for its slot.
 void FillConnectList(HWND page, const config::ConfigNetwork& network, int enteredFreeSlot)
 {
-    SendDlgItemMessageA(page, IDC_CONNECT_LIST, LB_RESETCONTENT, 0, 0);
+    const HWND listBox = GetDlgItem(page, IDC_CONNECT_LIST);
+    SendMessageA(listBox, LB_RESETCONTENT, 0, 0);
     for (const int slot : config::ListedConnectSlots(network, enteredFreeSlot))
-        AddLine(page, IDC_CONNECT_LIST, config::ConnectLine(network.connectList[slot]));
+        AddLine(listBox, config::ConnectLine(network.connectList[slot]));
 }
 
 // Stores an entered address and shows it. A 接続 address takes the first
@@ -94,7 +97,7 @@ void AddAddress(HWND page, const AddressList& list, config::CSaveConfig& record,
     }
     if (list.listBox != IDC_CONNECT_LIST)
     {
-        AddLine(page, list.listBox, list.line(entry));
+        AddLine(GetDlgItem(page, list.listBox), list.line(entry));
         return;
     }
     const config::ConfigNetwork& network = *record.Network();
@@ -152,10 +155,12 @@ void CConfigApplication::InitNetworkPage()
 
     enteredFreeConnectSlot_ = -1;
     FillConnectList(page, network, enteredFreeConnectSlot_);
+    const HWND allowList = GetDlgItem(page, IDC_ALLOW_LIST);
     for (std::uint32_t index = 0; index < network.allowCount; ++index)
-        AddLine(page, IDC_ALLOW_LIST, config::ListedLine(*record_->GetAllowEntry(index)));
+        AddLine(allowList, config::ListedLine(*record_->GetAllowEntry(index)));
+    const HWND denyList = GetDlgItem(page, IDC_DENY_LIST);
     for (std::uint32_t index = 0; index < network.denyCount; ++index)
-        AddLine(page, IDC_DENY_LIST, config::ListedLine(*record_->GetDenyEntry(index)));
+        AddLine(denyList, config::ListedLine(*record_->GetDenyEntry(index)));
 }
 
 LRESULT CConfigApplication::OnNetworkPage(HWND page, UINT message, WPARAM wParam, LPARAM)
