@@ -1,6 +1,7 @@
 #include "app/config_application.h"
 
 #include "app/system.h"
+#include "base/window_text_win32.h"
 #include "input/input.h"
 #include "resources/resource.h"
 #include "sound/audio_warm_up_win32.h"
@@ -33,7 +34,7 @@ LRESULT CALLBACK AppWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM 
     }
     if (application != nullptr)
         return application->WindowProc(window, message, wParam, lParam);
-    return DefWindowProcA(window, message, wParam, lParam);
+    return DefWindowProcW(window, message, wParam, lParam);
 }
 
 CConfigApplication::CConfigApplication()
@@ -57,7 +58,7 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
         return false;
     if (!record_->Load())
     {
-        MessageBoxA(nullptr, "コンフィグファイルが読み込めません", "", MB_OK);
+        base::ShowMessage(nullptr, "コンフィグファイルが読み込めません", "", MB_OK);
         return false;
     }
 
@@ -68,7 +69,7 @@ bool CConfigApplication::Init(HINSTANCE instance, WNDPROC procedure)
     system_ = new (std::nothrow) CSystem();
     if (system_ == nullptr)
         return false;
-    if (!system_->CreateDialogWindow(instance, MAKEINTRESOURCEA(IDD_MAIN), -1, -1, IDI_APP,
+    if (!system_->CreateDialogWindow(instance, IDD_MAIN, -1, -1, IDI_APP,
                                      reinterpret_cast<DLGPROC>(procedure), nullptr))
         return false;
     procedure_ = procedure;
@@ -130,7 +131,7 @@ bool CConfigApplication::Exit()
         for (SubclassedEdit* edit : {&musicEdits_[row], &tensionEdits_[row]})
         {
             if (edit->previousProcedure != nullptr)
-                SetWindowLongPtrA(edit->window, GWLP_WNDPROC,
+                SetWindowLongPtrW(edit->window, GWLP_WNDPROC,
                                   reinterpret_cast<LONG_PTR>(edit->previousProcedure));
         }
     }

@@ -1,11 +1,14 @@
 #include "app/system.h"
 
 #include "base/cp932.h"
+#include "base/window_text_win32.h"
 
 #include <commdlg.h>
 #include <cstdlib>
 #include <cstring>
 #include <mmsystem.h>
+#include <optional>
+#include <string>
 
 CSystem::CSystem()
     : instance_(nullptr), window_(nullptr), name_(nullptr), directory_(), width_(0), height_(0),
@@ -24,13 +27,13 @@ const char* CSystem::GetClassName() const
     return "CSystem";
 }
 
-bool CSystem::CreateDialogWindow(HINSTANCE instance, LPCSTR dialogTemplate, int x, int y, UINT,
+bool CSystem::CreateDialogWindow(HINSTANCE instance, int dialogTemplate, int x, int y, UINT,
                                  DLGPROC procedure, HWND parent)
 {
     if (instance == nullptr)
         return false;
     instance_ = instance;
-    window_ = CreateDialogParamA(instance, dialogTemplate, parent, procedure, 0);
+    window_ = base::CreateDialogFromTemplate(instance, dialogTemplate, parent, procedure);
     if (window_ == nullptr)
         return false;
     RECT rect;
@@ -72,7 +75,7 @@ void CSystem::SetName(const char* name)
     if (name_ == nullptr)
         return;
     std::memcpy(name_, name, size);
-    SetWindowTextA(window_, name_);
+    base::SetWindowText932(window_, name_);
 }
 
 bool CSystem::GetModuleDir(char* buffer, std::uint32_t size) const
@@ -103,22 +106,39 @@ bool CSystem::SetCurrentDir(const char* path)
     return SetCurrentDirectoryA(directory_) != 0;
 }
 
-bool CSystem::OpenFileDialog(char* file, const char* title, const char* filter,
-                             const char* defaultExtension)
+CSystem::FileChoice CSystem::OpenFileDialog(char* file, const char* title, const char* filter,
+                                            const char* defaultExtension)
 {
-    OPENFILENAMEA dialog = {};
+    // The pairs end at an empty description: the list is taken with its zeros.
+    const char* end = filter;
+    while (*end != '\0')
+        end += std::strlen(end) + 1;
+    const std::wstring filters = base::WideFrom932({filter, std::size_t(end - filter + 1)});
+    const std::wstring caption = base::WideFrom932(title);
+    const std::wstring extension = base::WideFrom932(defaultExtension);
+    std::wstring chosenPath = base::WideFromAnsi(file);
+    chosenPath.resize(MAX_PATH);
+
+    OPENFILENAMEW dialog = {};
     dialog.lStructSize = sizeof dialog;
     dialog.hwndOwner = window_;
-    dialog.lpstrFilter = filter;
-    dialog.lpstrFile = file;
+    dialog.lpstrFilter = filters.c_str();
+    dialog.lpstrFile = chosenPath.data();
     dialog.nMaxFile = MAX_PATH;
-    dialog.lpstrTitle = title;
+    dialog.lpstrTitle = caption.c_str();
     dialog.Flags = OFN_FILEMUSTEXIST;
-    dialog.lpstrDefExt = defaultExtension;
-    const BOOL chosen = GetOpenFileNameA(&dialog);
+    dialog.lpstrDefExt = extension.c_str();
+    const BOOL chosen = GetOpenFileNameW(&dialog);
     // Browsing may have moved the current directory away from the program's.
     SetCurrentDirectoryA(directory_);
-    return chosen != 0;
+    if (!chosen)
+        return FileChoice::Cancelled;
+    const std::optional<std::string> path = base::AnsiFrom(chosenPath.c_str());
+    if (!path)
+        return FileChoice::NotInCodePage;
+    std::strncpy(file, path->c_str(), MAX_PATH - 1);
+    file[MAX_PATH - 1] = '\0';
+    return FileChoice::Chosen;
 }
 
 void BeginFrameTimer(CSystem*, std::uint32_t)

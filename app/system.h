@@ -19,7 +19,7 @@ public:
     // Creates the modeless dialog from `dialogTemplate`; x or y below 0
     // centres it on the screen along that axis. The icon is accepted and not
     // applied.
-    bool CreateDialogWindow(HINSTANCE instance, LPCSTR dialogTemplate, int x, int y, UINT icon,
+    bool CreateDialogWindow(HINSTANCE instance, int dialogTemplate, int x, int y, UINT icon,
                             DLGPROC procedure, HWND parent);
     void SetName(const char* name);
     // Makes the window larger by the given amounts and centres it again on
@@ -30,11 +30,21 @@ public:
     bool GetModuleDir(char* buffer, std::uint32_t size) const;
     bool SetCurrentDir(const char* path);
 
+    enum class FileChoice
+    {
+        Chosen,
+        Cancelled, // or the dialog failed
+        // The chosen path holds a character the system's ANSI code page
+        // cannot, so the game could not open it.
+        NotInCodePage,
+    };
+
     // `file` is the caller's 260-byte buffer: the initial name on entry, the
-    // chosen path on success. False for cancel and errors alike; either way
-    // the program's directory is the current directory again afterwards.
-    bool OpenFileDialog(char* file, const char* title, const char* filter,
-                        const char* defaultExtension);
+    // chosen path on success, in the system's ANSI code page. The title and
+    // the filter are code page 932 texts. Either way the program's directory
+    // is the current directory again afterwards.
+    FileChoice OpenFileDialog(char* file, const char* title, const char* filter,
+                              const char* defaultExtension);
 
 private:
     HINSTANCE instance_;

@@ -13,17 +13,19 @@ int RunTool(HINSTANCE instance, void (*firstIdle)())
     if (!application->Init(instance, AppWindowProc))
         return -1;
 
+    // Wide messages: a character typed in any language reaches the edits
+    // as it is, whatever the system's code page.
     // The loop never waits: with the queue empty it updates continuously, so
     // that a key or button pressed for an assignment is seen at once.
     MSG message;
     for (;;)
     {
-        if (PeekMessageA(&message, nullptr, 0, 0, PM_REMOVE))
+        if (PeekMessageW(&message, nullptr, 0, 0, PM_REMOVE))
         {
             if (message.message == WM_QUIT)
                 break;
             TranslateMessage(&message);
-            DispatchMessageA(&message);
+            DispatchMessageW(&message);
             continue;
         }
         if (firstIdle != nullptr)

@@ -37,11 +37,11 @@ bool CConfigApplication::InitGamePage()
     for (const VolumeSlider& slider : kVolumeSliders)
     {
         const HWND bar = GetDlgItem(page, slider.id);
-        SendMessageA(bar, TBM_SETLINESIZE, 0, 10);
-        SendMessageA(bar, TBM_SETRANGE, TRUE, range);
+        SendMessageW(bar, TBM_SETLINESIZE, 0, 10);
+        SendMessageW(bar, TBM_SETRANGE, TRUE, range);
         // A stored silence (-10000) lies below the range and shows as its
         // left end; the field keeps it until a slider moves.
-        SendMessageA(bar, TBM_SETPOS, TRUE, game->*slider.field);
+        SendMessageW(bar, TBM_SETPOS, TRUE, game->*slider.field);
     }
 
     dialog::FillChoices(page, IDC_RADAR_TYPE, config::kRadarTypeNames, game->radarType);
@@ -65,7 +65,7 @@ LRESULT CConfigApplication::OnGamePage(HWND page, UINT message, WPARAM wParam, L
         for (const VolumeSlider& slider : kVolumeSliders)
         {
             const auto position =
-                static_cast<std::int32_t>(SendDlgItemMessageA(page, slider.id, TBM_GETPOS, 0, 0));
+                static_cast<std::int32_t>(SendDlgItemMessageW(page, slider.id, TBM_GETPOS, 0, 0));
             game->*slider.field = config::VolumeAtSliderPosition(position);
         }
         return TRUE;

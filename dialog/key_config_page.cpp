@@ -1,6 +1,7 @@
 // The key-config page: its two sub-pages filled at start-up, and what they
 // share.
 #include "app/config_application.h"
+#include "base/window_text_win32.h"
 #include "config/field_table.h"
 #include "dialog/key_pages.h"
 #include "resources/resource.h"
@@ -12,9 +13,10 @@ void ShowActions(HWND page, int firstLabel, int firstEdit,
 {
     for (int action = 0; action < config::kActionCount; ++action)
     {
-        SetDlgItemTextA(page, firstLabel + action, config::kActionLabels[action]);
+        base::SetItemText932(page, firstLabel + action, config::kActionLabels[action]);
         // A settings file may hold any value; only the low byte names it.
-        SetDlgItemTextA(page, firstEdit + action, name(static_cast<std::uint8_t>(codes[action])));
+        base::SetItemText932(page, firstEdit + action,
+                             name(static_cast<std::uint8_t>(codes[action])));
     }
 }
 
@@ -25,8 +27,8 @@ void ShowCapture(HWND page, int firstEdit, const input::Capture& capture, CodeNa
     for (int i = 0; i < capture.changeCount; ++i)
     {
         const input::CodeChange& change = capture.changes[i];
-        SetDlgItemTextA(page, firstEdit + change.action,
-                        name(static_cast<std::uint8_t>(change.code)));
+        base::SetItemText932(page, firstEdit + change.action,
+                             name(static_cast<std::uint8_t>(change.code)));
     }
     SetFocus(GetDlgItem(page, firstEdit + capture.nextFocus));
 }
@@ -45,9 +47,9 @@ bool CConfigApplication::InitKeyConfigPage()
     FillKeyboardPage();
     FillPadPage();
     const HWND players = GetDlgItem(keyPages_[kPadPageIndex].window, IDC_PAD_PLAYER);
-    SendMessageA(players, CB_RESETCONTENT, 0, 0);
+    SendMessageW(players, CB_RESETCONTENT, 0, 0);
     for (const char* player : {"1P", "2P", "3P", "4P"})
-        SendMessageA(players, CB_ADDSTRING, 0, reinterpret_cast<LPARAM>(player));
-    SendMessageA(players, CB_SETCURSEL, 0, 0);
+        base::AddComboItem(players, player);
+    SendMessageW(players, CB_SETCURSEL, 0, 0);
     return true;
 }

@@ -1,5 +1,6 @@
 // The main dialog's own handling: save, the closing questions and the tab.
 #include "app/config_application.h"
+#include "base/window_text_win32.h"
 #include "resources/resource.h"
 
 #include <commctrl.h>
@@ -38,7 +39,7 @@ LRESULT CConfigApplication::OnSave(HWND dialog)
     if (!record_->Save())
     {
         // The dialog stays open with every value, so saving can be tried again.
-        MessageBoxA(dialog, "保存に失敗しました", "エラー", MB_OK);
+        base::ShowMessage(dialog, "保存に失敗しました", "エラー", MB_OK);
         return FALSE;
     }
     ConfirmClose(dialog, "保存されました\nコンフィグツールを閉じますか？");
@@ -47,6 +48,6 @@ LRESULT CConfigApplication::OnSave(HWND dialog)
 
 void CConfigApplication::ConfirmClose(HWND dialog, const char* question)
 {
-    if (MessageBoxA(dialog, question, "終了確認", MB_YESNO | MB_ICONQUESTION) == IDYES)
+    if (base::ShowMessage(dialog, question, "終了確認", MB_YESNO | MB_ICONQUESTION) == IDYES)
         DestroyWindow(dialog);
 }

@@ -3,12 +3,14 @@
 // buttons run. Every change goes into the record at once.
 #include "app/config_application.h"
 #include "app/system.h"
+#include "base/window_text_win32.h"
 #include "config/field_table.h"
 #include "config/fixed_text.h"
 #include "config/ip_address.h"
 #include "dialog/page_controls.h"
 #include "resources/resource.h"
 
+#include <algorithm>
 #include <cstdio>
 #include <string>
 #include <vector>
@@ -45,6 +47,14 @@ const AddressList kAddressLists[] = {
      "拒否IPアドレスの追加に失敗しました。"},
 };
 
+// The port's and the octets' text as the fields are read: at most 29 bytes.
+std::string FieldInput(HWND edit)
+{
+    std::string text = base::WindowText932(edit);
+    text.resize(std::min<std::size_t>(text.size(), 29));
+    return text;
+}
+
 const AddressList* ListAddedBy(int button)
 {
     for (const AddressList& list : kAddressLists)
@@ -69,7 +79,7 @@ const AddressList* ListDeletedBy(int button)
 // a call to its server, and a list can hold 24 lines.
 void AddLine(HWND listBox, const std::string& line)
 {
-    SendMessageA(listBox, LB_ADDSTRING, 0, reinterpret_cast<LPARAM>(line.c_str()));
+    base::AddListItem(listBox, line);
 }
 
 // The 接続 list shows the slots ListedConnectSlots names, and is filled anew
@@ -77,7 +87,7 @@ void AddLine(HWND listBox, const std::string& line)
 void FillConnectList(HWND page, const config::ConfigNetwork& network, int enteredFreeSlot)
 {
     const HWND listBox = GetDlgItem(page, IDC_CONNECT_LIST);
-    SendMessageA(listBox, LB_RESETCONTENT, 0, 0);
+    SendMessageW(listBox, LB_RESETCONTENT, 0, 0);
     for (const int slot : config::ListedConnectSlots(network, enteredFreeSlot))
         AddLine(listBox, config::ConnectLine(network.connectList[slot]));
 }
@@ -92,7 +102,7 @@ void AddAddress(HWND page, const AddressList& list, config::CSaveConfig& record,
     const int slot = config::FirstEmptyConnectSlot(*record.Network());
     if (!(record.*list.add)(entry))
     {
-        MessageBoxA(page, list.addFailure, kErrorCaption, MB_OK);
+        base::ShowMessage(page, list.addFailure, kErrorCaption, MB_OK);
         return;
     }
     if (list.listBox != IDC_CONNECT_LIST)
@@ -109,7 +119,7 @@ void DeleteAddress(HWND page, const AddressList& list, config::CSaveConfig& reco
                    int& enteredFreeSlot)
 {
     const auto selected =
-        static_cast<std::int32_t>(SendDlgItemMessageA(page, list.listBox, LB_GETCURSEL, 0, 0));
+        static_cast<std::int32_t>(SendDlgItemMessageW(page, list.listBox, LB_GETCURSEL, 0, 0));
     std::int32_t index = selected;
     if (list.listBox == IDC_CONNECT_LIST)
     {
@@ -119,12 +129,13 @@ void DeleteAddress(HWND page, const AddressList& list, config::CSaveConfig& reco
     }
     if (!(record.*list.remove)(index))
     {
-        MessageBoxA(page, "削除するIPアドレスをリストから選択してください。", kErrorCaption, MB_OK);
+        base::ShowMessage(page, "削除するIPアドレスをリストから選択してください。", kErrorCaption,
+                          MB_OK);
         return;
     }
     if (list.listBox != IDC_CONNECT_LIST)
     {
-        SendDlgItemMessageA(page, list.listBox, LB_DELETESTRING, selected, 0);
+        SendDlgItemMessageW(page, list.listBox, LB_DELETESTRING, selected, 0);
         return;
     }
     // The slots after the removed one moved up by one.
@@ -142,11 +153,11 @@ void CConfigApplication::InitNetworkPage()
 
     // Each text set here comes back at once as the edit's update, so the
     // record's fields are read into copies first.
-    SetDlgItemTextA(page, IDC_NETWORK_LOBBY_ID, config::FieldText(network.lobbyId).c_str());
-    SetDlgItemTextA(page, IDC_NETWORK_DIRECT_ID, config::FieldText(network.directId).c_str());
+    base::SetItemText932(page, IDC_NETWORK_LOBBY_ID, config::FieldText(network.lobbyId));
+    base::SetItemText932(page, IDC_NETWORK_DIRECT_ID, config::FieldText(network.directId));
     char port[16];
     std::snprintf(port, sizeof port, "%d", network.port);
-    SetDlgItemTextA(page, IDC_NETWORK_PORT, port);
+    base::SetItemText932(page, IDC_NETWORK_PORT, port);
 
     dialog::ShowCheck(page, IDC_NETWORK_USE_UPNP, network.useUpnp != 0);
     dialog::ShowCheck(page, IDC_NETWORK_PLAY_BGM, network.playBgm != 0);
@@ -173,23 +184,18 @@ LRESULT CConfigApplication::OnNetworkPage(HWND page, UINT message, WPARAM wParam
 
     if (code == EN_UPDATE)
     {
-        // More than an ID keeps, so that it is cut at a character's end.
-        char text[64] = {};
+        const HWND edit = GetDlgItem(page, control);
         if (control == IDC_NETWORK_PORT)
-        {
-            GetDlgItemTextA(page, control, text, 30);
-            network.port = config::ReadPort(text);
-            return 1;
-        }
-        GetDlgItemTextA(page, control, text, sizeof text);
-        if (control == IDC_NETWORK_LOBBY_ID)
-            config::StoreFieldText(network.lobbyId, config::kIdTextLimit, text);
+            network.port = config::ReadPort(FieldInput(edit).c_str());
+        else if (control == IDC_NETWORK_LOBBY_ID)
+            config::StoreFieldText(network.lobbyId, config::kIdTextLimit, base::TakeTyped932(edit));
         else if (control == IDC_NETWORK_DIRECT_ID)
-            config::StoreFieldText(network.directId, config::kIdTextLimit, text);
+            config::StoreFieldText(network.directId, config::kIdTextLimit,
+                                   base::TakeTyped932(edit));
     }
     else if (code == CBN_SELCHANGE && control == IDC_NETWORK_KEY_RESPONSE)
     {
-        const LRESULT choice = SendDlgItemMessageA(page, control, CB_GETCURSEL, 0, 0);
+        const LRESULT choice = SendDlgItemMessageW(page, control, CB_GETCURSEL, 0, 0);
         if (choice != CB_ERR)
             network.keyResponse = static_cast<std::uint8_t>(choice);
     }
@@ -201,9 +207,8 @@ LRESULT CConfigApplication::OnNetworkPage(HWND page, UINT message, WPARAM wParam
             network.playBgm = dialog::CheckValue(page, control);
         else if (const AddressList* list = ListAddedBy(control))
         {
-            if (DialogBoxParamA(system_->GetInstance(), MAKEINTRESOURCEA(IDD_IP_ENTRY),
-                                system_->GetHwnd(), IpEntryDialogProc,
-                                reinterpret_cast<LPARAM>(this)) == 1)
+            if (base::RunModalDialog(system_->GetInstance(), IDD_IP_ENTRY, system_->GetHwnd(),
+                                     IpEntryDialogProc, reinterpret_cast<LPARAM>(this)) == 1)
                 AddAddress(page, *list, *record_, ipEntry_, enteredFreeConnectSlot_);
         }
         else if (const AddressList* list = ListDeletedBy(control))
@@ -216,9 +221,9 @@ INT_PTR CALLBACK CConfigApplication::IpEntryDialogProc(HWND dialog, UINT message
                                                        LPARAM lParam)
 {
     if (message == WM_INITDIALOG)
-        SetWindowLongPtrA(dialog, GWLP_USERDATA, lParam);
+        SetWindowLongPtrW(dialog, GWLP_USERDATA, lParam);
     auto* application =
-        reinterpret_cast<CConfigApplication*>(GetWindowLongPtrA(dialog, GWLP_USERDATA));
+        reinterpret_cast<CConfigApplication*>(GetWindowLongPtrW(dialog, GWLP_USERDATA));
     if (application == nullptr)
         return 0;
     return application->OnIpEntryDialog(dialog, message, wParam, lParam);
@@ -231,8 +236,8 @@ LRESULT CConfigApplication::OnIpEntryDialog(HWND dialog, UINT message, WPARAM wP
     case WM_INITDIALOG:
         for (int field : kOctetFields)
         {
-            SetDlgItemTextA(dialog, field, "");
-            SendDlgItemMessageA(dialog, field, EM_LIMITTEXT, 3, 0);
+            base::SetItemText932(dialog, field, "");
+            SendDlgItemMessageW(dialog, field, EM_LIMITTEXT, 3, 0);
         }
         return 1;
     case WM_CLOSE:
@@ -261,12 +266,11 @@ bool CConfigApplication::ReadIpEntry(HWND dialog)
 {
     for (int octet = 0; octet < 4; ++octet)
     {
-        char text[30] = {};
-        GetDlgItemTextA(dialog, kOctetFields[octet], text, sizeof text);
-        if (!config::ReadOctet(text, ipEntry_.octets[octet]))
+        const std::string text = FieldInput(GetDlgItem(dialog, kOctetFields[octet]));
+        if (!config::ReadOctet(text.c_str(), ipEntry_.octets[octet]))
         {
-            MessageBoxA(dialog, "IPアドレスには0～255までの数字を入力してください。", kErrorCaption,
-                        MB_OK);
+            base::ShowMessage(dialog, "IPアドレスには0～255までの数字を入力してください。",
+                              kErrorCaption, MB_OK);
             return false;
         }
     }

@@ -3,6 +3,7 @@
 // reads the shown player's controller through that player's buttons, so a
 // press of an assigned button shows as its action's button going down.
 #include "app/config_application.h"
+#include "base/window_text_win32.h"
 #include "dialog/key_pages.h"
 #include "input/input.h"
 #include "resources/resource.h"
@@ -16,18 +17,19 @@ void CConfigApplication::FillPadPage()
     input::BindPlayerToSlot(player, input_->GetSlot(0));
 
     const HWND devices = GetDlgItem(page, IDC_PAD_DEVICE);
-    SendMessageA(devices, CB_RESETCONTENT, 0, 0);
+    SendMessageW(devices, CB_RESETCONTENT, 0, 0);
     const int count = input_->GetJoystickCount();
     for (int index = 0; index < count; ++index)
     {
         // A controller whose set-up failed keeps its place with an empty
-        // name, so that list positions stay controller numbers.
+        // name, so that list positions stay controller numbers. DirectInput's
+        // ANSI interface names it in the system's code page.
         const DIDEVICEINSTANCEA* info = input_->GetJoystickInfo(static_cast<std::uint8_t>(index));
-        const char* name = info != nullptr ? info->tszInstanceName : "";
-        SendMessageA(devices, CB_ADDSTRING, 0, reinterpret_cast<LPARAM>(name));
+        base::AddComboItem(devices,
+                           base::WideFromAnsi(info != nullptr ? info->tszInstanceName : ""));
     }
     // A controller that is not attached now selects nothing.
-    SendMessageA(devices, CB_SETCURSEL, player.device < count ? player.device : -1, 0);
+    SendMessageW(devices, CB_SETCURSEL, player.device < count ? player.device : -1, 0);
 }
 
 LRESULT CConfigApplication::OnPadPage(HWND page, UINT message, WPARAM wParam, LPARAM)
@@ -44,7 +46,7 @@ LRESULT CConfigApplication::OnPadPage(HWND page, UINT message, WPARAM wParam, LP
     }
     else if (notification == CBN_SELCHANGE && (id == IDC_PAD_DEVICE || id == IDC_PAD_PLAYER))
     {
-        const LRESULT selection = SendDlgItemMessageA(page, id, CB_GETCURSEL, 0, 0);
+        const LRESULT selection = SendDlgItemMessageW(page, id, CB_GETCURSEL, 0, 0);
         // Nothing selected: the player and the device stay as they are.
         if (selection == CB_ERR)
             return TRUE;

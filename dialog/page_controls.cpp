@@ -1,5 +1,7 @@
 #include "dialog/page_controls.h"
 
+#include "base/window_text_win32.h"
+
 namespace dialog
 {
 namespace
@@ -9,24 +11,24 @@ void Fill(HWND page, int id, std::span<const char* const> options, WPARAM select
     // Looked up once: under Wine every lookup is a call to its server.
     const HWND list = GetDlgItem(page, id);
     for (const char* option : options)
-        SendMessageA(list, CB_ADDSTRING, 0, reinterpret_cast<LPARAM>(option));
-    SendMessageA(list, CB_SETCURSEL, selection, 0);
+        base::AddComboItem(list, option);
+    SendMessageW(list, CB_SETCURSEL, selection, 0);
 }
 
 LRESULT Selection(HWND page, int id)
 {
-    return SendDlgItemMessageA(page, id, CB_GETCURSEL, 0, 0);
+    return SendDlgItemMessageW(page, id, CB_GETCURSEL, 0, 0);
 }
 } // namespace
 
 void ShowCheck(HWND page, int id, bool checked)
 {
-    SendDlgItemMessageA(page, id, BM_SETCHECK, checked ? BST_CHECKED : BST_UNCHECKED, 0);
+    SendDlgItemMessageW(page, id, BM_SETCHECK, checked ? BST_CHECKED : BST_UNCHECKED, 0);
 }
 
 bool IsChecked(HWND page, int id)
 {
-    return SendDlgItemMessageA(page, id, BM_GETCHECK, 0, 0) == BST_CHECKED;
+    return SendDlgItemMessageW(page, id, BM_GETCHECK, 0, 0) == BST_CHECKED;
 }
 
 std::uint32_t CheckValue(HWND page, int id)

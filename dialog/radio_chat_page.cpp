@@ -1,6 +1,7 @@
 // The Radio-chat page: the twelve messages of the function keys F1 to F12
 // and whether each goes to everyone.
 #include "app/config_application.h"
+#include "base/window_text_win32.h"
 #include "config/fixed_text.h"
 #include "dialog/page_controls.h"
 #include "resources/resource.h"
@@ -22,11 +23,7 @@ constexpr int ToAllId(int row)
 // Takes the edit's whole text and keeps what the field holds of it.
 void KeepMessage(HWND edit, config::RadioChatEntry* entry)
 {
-    const int capacity = GetWindowTextLengthA(edit) + 1;
-    std::string text(static_cast<std::size_t>(capacity), '\0');
-    const int length = GetWindowTextA(edit, text.data(), capacity);
-    text.resize(static_cast<std::size_t>(length > 0 ? length : 0));
-    config::StoreFieldText(entry->text, config::kRadioChatTextLimit, text);
+    config::StoreFieldText(entry->text, config::kRadioChatTextLimit, base::TakeTyped932(edit));
 }
 } // namespace
 
@@ -40,7 +37,7 @@ bool CConfigApplication::InitRadioChatPage()
         const std::string text = config::FieldText(entry.text);
         // The edit reports the new text at once (EN_UPDATE): the record then
         // holds only what it can keep of it.
-        SetDlgItemTextA(page, TextId(row), text.c_str());
+        base::SetItemText932(page, TextId(row), text);
         dialog::ShowCheck(page, ToAllId(row), entry.notToAll == 0);
     }
     return true;

@@ -2,6 +2,7 @@
 // tool to the handler of the window it belongs to.
 #include "app/config_application.h"
 #include "app/system.h"
+#include "base/window_text_win32.h"
 #include "resources/resource.h"
 
 #include <algorithm>
@@ -34,20 +35,12 @@ const PageEntry kKeyPages[kKeyPageCount] = {
     {"コントローラー", IDD_PAD_PAGE, &CConfigApplication::OnPadPage},
 };
 
-void InsertTabItem(HWND tab, int index, const char* caption)
-{
-    TCITEMA item = {};
-    item.mask = TCIF_TEXT;
-    item.pszText = const_cast<char*>(caption);
-    SendMessageA(tab, TCM_INSERTITEMA, index, reinterpret_cast<LPARAM>(&item));
-}
-
 // The tab's client area less its tabs, in the tab's client coordinates.
 RECT DisplayArea(HWND tab)
 {
     RECT area;
     GetClientRect(tab, &area);
-    SendMessageA(tab, TCM_ADJUSTRECT, FALSE, reinterpret_cast<LPARAM>(&area));
+    SendMessageW(tab, TCM_ADJUSTRECT, FALSE, reinterpret_cast<LPARAM>(&area));
     return area;
 }
 
@@ -118,13 +111,13 @@ void CConfigApplication::CreatePages(HINSTANCE instance)
 
     mainTab_ = GetDlgItem(mainDialog, IDC_MAIN_TAB);
     for (int index = 0; index < kPageCount; ++index)
-        InsertTabItem(mainTab_, index, kPages[index].caption);
+        base::InsertTabItem(mainTab_, index, kPages[index].caption);
     RECT pageArea = DisplayArea(mainTab_);
     for (int index = 0; index < kPageCount; ++index)
     {
         pages_[index].templateId = kPages[index].templateId;
-        pages_[index].window = CreateDialogParamA(
-            instance, MAKEINTRESOURCEA(kPages[index].templateId), mainTab_, dialogProcedure, 0);
+        pages_[index].window = base::CreateDialogFromTemplate(
+            instance, static_cast<int>(kPages[index].templateId), mainTab_, dialogProcedure);
     }
 
     const HWND keyConfigPage = pages_[kKeyConfigPageIndex].window;
@@ -133,8 +126,8 @@ void CConfigApplication::CreatePages(HINSTANCE instance)
     {
         keyPages_[index].templateId = kKeyPages[index].templateId;
         keyPages_[index].window =
-            CreateDialogParamA(instance, MAKEINTRESOURCEA(kKeyPages[index].templateId),
-                               keyConfigPage, dialogProcedure, 0);
+            base::CreateDialogFromTemplate(instance, static_cast<int>(kKeyPages[index].templateId),
+                                           keyConfigPage, dialogProcedure);
     }
 
     // The pages are laid out in a larger font than the main dialog, so at
@@ -165,7 +158,7 @@ void CConfigApplication::CreatePages(HINSTANCE instance)
     SelectPage(0);
 
     for (int index = 0; index < kKeyPageCount; ++index)
-        InsertTabItem(keyTab_, index, kKeyPages[index].caption);
+        base::InsertTabItem(keyTab_, index, kKeyPages[index].caption);
     // The sub-pages are children of the page, not of its tab control.
     RECT keyArea = DisplayArea(keyTab_);
     MapWindowPoints(keyTab_, keyConfigPage, reinterpret_cast<POINT*>(&keyArea), 2);
@@ -217,13 +210,13 @@ LRESULT CConfigApplication::OnKeyConfigPage(HWND, UINT message, WPARAM, LPARAM l
     if (message != WM_NOTIFY)
         return FALSE;
     if (IsSelectionChange(lParam, keyTab_))
-        SelectKeyPage(static_cast<int>(SendMessageA(keyTab_, TCM_GETCURSEL, 0, 0)));
+        SelectKeyPage(static_cast<int>(SendMessageW(keyTab_, TCM_GETCURSEL, 0, 0)));
     return TRUE;
 }
 
 LRESULT CConfigApplication::OnMainTabNotify(LPARAM lParam)
 {
     if (IsSelectionChange(lParam, mainTab_))
-        SelectPage(static_cast<int>(SendMessageA(mainTab_, TCM_GETCURSEL, 0, 0)));
+        SelectPage(static_cast<int>(SendMessageW(mainTab_, TCM_GETCURSEL, 0, 0)));
     return TRUE;
 }

@@ -4,6 +4,7 @@
 // way the game will load it.
 #include "app/config_application.h"
 #include "app/system.h"
+#include "base/window_text_win32.h"
 #include "config/fixed_text.h"
 #include "dialog/user_music_values.h"
 #include "resources/resource.h"
@@ -20,6 +21,17 @@ namespace
 constexpr char kMusicFilter[] = "すべての対応ファイル\0*.wav;*.ogg\0すべてのファイル(*.*)\0*.*\0";
 constexpr char kTensionFilter[] = "すべての対応ファイル\0*.txt\0すべてのファイル(*.*)\0*.*\0";
 
+// A path is kept in the system's ANSI code page, the one the game opens it
+// with; one that code page cannot hold would reach the game damaged.
+constexpr char kPathNotInCodePage[] =
+    "このパスには、このシステムの文字コードで表せない文字が含まれているため、"
+    "ゲームが開けません。\n別の名前のファイルかフォルダーを選んでください。";
+
+void RefusePath()
+{
+    base::ShowMessage(nullptr, kPathNotInCodePage, "", MB_OK);
+}
+
 // Sends the edit's messages through `procedure` from now on and shows the
 // path; the edit takes files dropped from the shell.
 void Subclass(SubclassedEdit& edit, HWND page, int id, WNDPROC procedure, const std::string& path)
@@ -31,30 +43,45 @@ void Subclass(SubclassedEdit& edit, HWND page, int id, WNDPROC procedure, const 
     // Kept before the new procedure is in place: the first message it sees
     // is passed on to this one.
     edit.previousProcedure =
-        reinterpret_cast<WNDPROC>(GetWindowLongPtrA(edit.window, GWLP_WNDPROC));
-    SetWindowLongPtrA(edit.window, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(procedure));
-    SetWindowTextA(edit.window, path.c_str());
+        reinterpret_cast<WNDPROC>(GetWindowLongPtrW(edit.window, GWLP_WNDPROC));
+    SetWindowLongPtrW(edit.window, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(procedure));
+    base::SetPathText(edit.window, path);
     DragAcceptFiles(edit.window, TRUE);
 }
 
 // The first file of a drop goes into the field and the edit; any further
-// ones are ignored. A drop without a file leaves both as they were.
+// ones are ignored. A drop without a file, or of a path the game could not
+// open, leaves both as they were.
 void TakeDroppedFile(HDROP drop, HWND edit, char (&field)[config::kPathCapacity])
 {
-    char path[config::kPathCapacity] = {};
-    if (DragQueryFileA(drop, 0, path, sizeof path) != 0)
-    {
-        config::StoreFieldText(field, config::kPathTextLimit, path);
-        SetWindowTextA(edit, path);
-    }
+    std::wstring path(DragQueryFileW(drop, 0, nullptr, 0), L'\0');
+    const bool dropped =
+        !path.empty() && DragQueryFileW(drop, 0, path.data(), UINT(path.size() + 1)) != 0;
     DragFinish(drop);
+    if (!dropped)
+        return;
+    const std::optional<std::string> held = base::AnsiFrom(path);
+    if (!held)
+    {
+        RefusePath();
+        return;
+    }
+    config::StoreFieldText(field, config::kPathTextLimit, *held);
+    base::SetPathText(edit, *held);
 }
 
+// A typed path the game could not open is refused whole: the edit shows the
+// stored path again.
 void StoreEditText(HWND edit, char (&field)[config::kPathCapacity])
 {
-    char text[config::kPathCapacity] = {};
-    GetWindowTextA(edit, text, sizeof text);
-    config::StoreFieldText(field, config::kPathTextLimit, text);
+    const std::optional<std::string> path = base::AnsiFrom(base::WindowTextWide(edit));
+    if (path)
+    {
+        config::StoreFieldText(field, config::kPathTextLimit, *path);
+        return;
+    }
+    base::SetPathText(edit, config::FieldText(field));
+    RefusePath();
 }
 
 // The music file, then at once its tension file. The main dialog stays
@@ -65,22 +92,28 @@ void BrowseRow(CSystem& system, config::UserBgmRow& paths, HWND musicEdit, HWND 
     const HWND mainDialog = system.GetHwnd();
     EnableWindow(mainDialog, FALSE);
     char music[config::kPathCapacity] = {};
-    if (!system.OpenFileDialog(music, "BGMファイルを開く", kMusicFilter, "wav"))
+    const CSystem::FileChoice musicChoice =
+        system.OpenFileDialog(music, "BGMファイルを開く", kMusicFilter, "wav");
+    if (musicChoice != CSystem::FileChoice::Chosen)
     {
         EnableWindow(mainDialog, TRUE);
+        if (musicChoice == CSystem::FileChoice::NotInCodePage)
+            RefusePath();
         return;
     }
     config::StoreFieldText(paths.musicPath, config::kPathTextLimit, music);
-    SetWindowTextA(musicEdit, music);
+    base::SetPathText(musicEdit, music);
 
     char tensionFile[config::kPathCapacity] = {};
-    const bool chosen =
+    const CSystem::FileChoice tensionChoice =
         system.OpenFileDialog(tensionFile, "テンションファイルを開く", kTensionFilter, "txt");
     EnableWindow(mainDialog, TRUE);
-    if (!chosen)
+    if (tensionChoice == CSystem::FileChoice::NotInCodePage)
+        RefusePath();
+    if (tensionChoice != CSystem::FileChoice::Chosen)
         return;
     config::StoreFieldText(paths.tensionPath, config::kPathTextLimit, tensionFile);
-    SetWindowTextA(tensionEdit, tensionFile);
+    base::SetPathText(tensionEdit, tensionFile);
 }
 
 // Shows the outcome in a plain box; the record is only read.
@@ -90,7 +123,7 @@ bool CheckRow(const config::UserBgmRow& paths)
     const tension::MusicCheckResult result =
         tension::CheckMusicRow(config::FieldText(paths.musicPath).c_str(),
                                config::FieldText(paths.tensionPath).c_str(), &message);
-    MessageBoxA(nullptr, message.CStr(), "", MB_OK);
+    base::ShowMessage(nullptr, message.CStr(), "", MB_OK);
     return result == tension::MusicCheckResult::Accepted;
 }
 
@@ -122,7 +155,7 @@ LRESULT CConfigApplication::OnUserMusicEdit(HWND edit, UINT message, WPARAM wPar
         if (message != WM_DROPFILES)
         {
             const SubclassedEdit& entry = isMusic ? musicEdits_[row] : tensionEdits_[row];
-            return CallWindowProcA(entry.previousProcedure, edit, message, wParam, lParam);
+            return CallWindowProcW(entry.previousProcedure, edit, message, wParam, lParam);
         }
         config::UserBgmRow& paths = music->rows[row];
         TakeDroppedFile(reinterpret_cast<HDROP>(wParam), edit,

@@ -1,3 +1,4 @@
+#include "base/window_text_win32.h"
 #include "input/direct_input.h"
 
 #include <cstring>
@@ -13,7 +14,7 @@ constexpr LONG kAxisMax = 1000;
 
 void ShowError(const char* text)
 {
-    ::MessageBoxA(nullptr, text, "Error", MB_OK);
+    base::ShowMessage(nullptr, text, "Error", MB_OK);
 }
 
 // The texts of a system device's set-up steps.

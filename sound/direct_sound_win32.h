@@ -22,10 +22,11 @@ namespace sound
 struct DeviceApi
 {
     HRESULT(WINAPI* createDevice)(LPCGUID, LPDIRECTSOUND8*, LPUNKNOWN);
-    int(WINAPI* messageBox)(HWND, LPCSTR, LPCSTR, UINT);
+    // A message box of code page 932 texts.
+    int (*messageBox)(HWND, const char*, const char*, UINT);
 };
 
-// DirectSoundCreate8 and MessageBoxA.
+// DirectSoundCreate8 and the tool's message box.
 const DeviceApi& SystemDeviceApi();
 
 struct CSound::Platform

@@ -20,7 +20,7 @@ inline constexpr std::uint32_t kMasterBufferCaps =
     kCapsCtrlVolume | kCapsGlobalFocus | kCapsGetCurrentPosition2;
 
 // The platform functions that CSound::Init calls (defined per platform:
-// DirectSoundCreate8 and MessageBoxA on Windows; nothing on POSIX). Tests on
+// DirectSoundCreate8 and the tool's message box on Windows; nothing on POSIX). Tests on
 // Windows pass their own to reach each failure of Init.
 struct DeviceApi;
 

@@ -1,4 +1,5 @@
 // The sound device on DirectSound 8.
+#include "base/window_text_win32.h"
 #include "sound/direct_sound_win32.h"
 
 #include <cstring>
@@ -52,7 +53,7 @@ template <typename Interface> Interface* Requery(IUnknown* unknown, REFIID iid)
 
 const DeviceApi& SystemDeviceApi()
 {
-    static const DeviceApi api{DirectSoundCreate8, MessageBoxA};
+    static const DeviceApi api{DirectSoundCreate8, base::ShowMessage};
     return api;
 }
 
