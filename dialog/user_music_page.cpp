@@ -81,6 +81,9 @@ void StoreEditText(HWND edit, char (&field)[config::kPathCapacity])
         return;
     }
     base::SetPathText(edit, config::FieldText(field));
+    // Typing goes on at the end of the path, not before it.
+    const int end = GetWindowTextLengthW(edit);
+    SendMessageW(edit, EM_SETSEL, end, end);
     RefusePath();
 }
 

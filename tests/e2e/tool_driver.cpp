@@ -1,6 +1,10 @@
 #include "tests/e2e/tool_driver.h"
 
+#include "base/window_text_win32.h"
+
+#include <commctrl.h>
 #include <cstring>
+#include <vector>
 
 namespace e2e
 {
@@ -15,11 +19,93 @@ bool WaitFor(const std::function<bool()>& done, DWORD timeoutMs)
     return true;
 }
 
+std::wstring WideText(HWND window)
+{
+    wchar_t text[1024] = {};
+    SendMessageW(window, WM_GETTEXT, std::size(text), reinterpret_cast<LPARAM>(text));
+    return text;
+}
+
 std::string WindowText(HWND window)
 {
-    char text[1024] = {};
-    SendMessageA(window, WM_GETTEXT, sizeof text, reinterpret_cast<LPARAM>(text));
+    return base::Cp932From(WideText(window));
+}
+
+namespace
+{
+
+// A list's line by its index, through `lengthMessage` and `textMessage`.
+std::wstring ItemText(HWND list, UINT lengthMessage, UINT textMessage, WPARAM index)
+{
+    const LRESULT length = SendMessageW(list, lengthMessage, index, 0);
+    std::wstring text(static_cast<std::size_t>(length > 0 ? length : 0) + 1, L'\0');
+    SendMessageW(list, textMessage, index, reinterpret_cast<LPARAM>(text.data()));
+    return text.c_str();
+}
+
+// A tab's item text: the item and its text are lent from the tool.
+std::wstring TabItemText(HWND tab, int index)
+{
+    constexpr int kCapacity = 128;
+    LentMemory lent(tab, sizeof(TCITEMW) + kCapacity * sizeof(wchar_t));
+    TCITEMW item = {};
+    item.mask = TCIF_TEXT;
+    item.pszText = reinterpret_cast<wchar_t*>(lent.Remote() + sizeof item);
+    item.cchTextMax = kCapacity;
+    lent.Write(&item, sizeof item);
+    wchar_t text[kCapacity] = {};
+    if (SendMessageW(tab, TCM_GETITEMW, index, reinterpret_cast<LPARAM>(lent.Remote())) != 0)
+        lent.Read(text, sizeof text - sizeof(wchar_t), sizeof item);
     return text;
+}
+
+std::vector<std::wstring> TextsOf(HWND control, const std::wstring& kind)
+{
+    std::vector<std::wstring> texts;
+    if (kind == L"ComboBox")
+    {
+        const LRESULT count = SendMessageW(control, CB_GETCOUNT, 0, 0);
+        for (LRESULT index = 0; index < count; ++index)
+            texts.push_back(ItemText(control, CB_GETLBTEXTLEN, CB_GETLBTEXT, index));
+    }
+    else if (kind == L"ListBox")
+    {
+        const LRESULT count = SendMessageW(control, LB_GETCOUNT, 0, 0);
+        for (LRESULT index = 0; index < count; ++index)
+            texts.push_back(ItemText(control, LB_GETTEXTLEN, LB_GETTEXT, index));
+    }
+    else if (kind == WC_TABCONTROLW)
+    {
+        const auto count = static_cast<int>(SendMessageW(control, TCM_GETITEMCOUNT, 0, 0));
+        for (int index = 0; index < count; ++index)
+            texts.push_back(TabItemText(control, index));
+    }
+    else if (kind == L"Static" || kind == L"Button" || kind == L"Edit")
+    {
+        texts.push_back(WideText(control));
+    }
+    return texts;
+}
+
+} // namespace
+
+std::wstring ShownTexts(HWND dialog)
+{
+    std::wstring lines = L"caption: " + WideText(dialog) + L"\n";
+    EnumChildWindows(
+        dialog,
+        [](HWND control, LPARAM parameter) -> BOOL
+        {
+            wchar_t kind[64] = {};
+            GetClassNameW(control, kind, std::size(kind));
+            const std::wstring name = std::to_wstring(GetDlgCtrlID(GetParent(control))) + L"/" +
+                                      std::to_wstring(GetDlgCtrlID(control)) + L" " + kind + L": ";
+            for (const std::wstring& text : TextsOf(control, kind))
+                *reinterpret_cast<std::wstring*>(parameter) += name + text + L"\n";
+            return TRUE;
+        },
+        reinterpret_cast<LPARAM>(&lines));
+    return lines;
 }
 
 HWND FindControl(HWND dialog, int id)
@@ -36,6 +122,32 @@ HWND FindControl(HWND dialog, int id)
         },
         reinterpret_cast<LPARAM>(&search));
     return search.second;
+}
+
+LentMemory::LentMemory(HWND window, std::size_t size)
+{
+    DWORD processId = 0;
+    GetWindowThreadProcessId(window, &processId);
+    process_ =
+        OpenProcess(PROCESS_VM_OPERATION | PROCESS_VM_READ | PROCESS_VM_WRITE, FALSE, processId);
+    remote_ = static_cast<char*>(
+        VirtualAllocEx(process_, nullptr, size, MEM_COMMIT | MEM_RESERVE, PAGE_READWRITE));
+}
+
+LentMemory::~LentMemory()
+{
+    VirtualFreeEx(process_, remote_, 0, MEM_RELEASE);
+    CloseHandle(process_);
+}
+
+void LentMemory::Write(const void* data, std::size_t size, std::size_t offset)
+{
+    WriteProcessMemory(process_, remote_ + offset, data, size, nullptr);
+}
+
+void LentMemory::Read(void* data, std::size_t size, std::size_t offset) const
+{
+    ReadProcessMemory(process_, remote_ + offset, data, size, nullptr);
 }
 
 ToolProcess::ToolProcess(const std::string& program, const std::string& arguments)

@@ -15,6 +15,9 @@ namespace e2e
 // Polls until `done` holds; false after the timeout.
 bool WaitFor(const std::function<bool()>& done, DWORD timeoutMs = 10000);
 
+// Read wide, as a user sees it whatever the code page of either process;
+// WindowText gives it in code page 932, the tool's own texts' form.
+std::wstring WideText(HWND window);
 std::string WindowText(HWND window);
 // A control anywhere below `dialog` (its pages included), by its id.
 HWND FindControl(HWND dialog, int id);
@@ -24,6 +27,31 @@ inline void PostCommand(HWND dialog, int id)
 {
     PostMessageA(dialog, WM_COMMAND, id, 0);
 }
+
+// Every text a user sees below `dialog`, one line per text (a list's or a
+// tab's items each on its own line), each named by its control's parent id,
+// id and class, in window order.
+std::wstring ShownTexts(HWND dialog);
+
+// Memory in the process of `window`, for the messages that write through a
+// pointer (TCM_GETITEMW, TCM_ADJUSTRECT): they write in the receiver's own
+// address space.
+class LentMemory
+{
+public:
+    LentMemory(HWND window, std::size_t size);
+    ~LentMemory();
+    LentMemory(const LentMemory&) = delete;
+    LentMemory& operator=(const LentMemory&) = delete;
+
+    char* Remote() const { return remote_; }
+    void Write(const void* data, std::size_t size, std::size_t offset = 0);
+    void Read(void* data, std::size_t size, std::size_t offset = 0) const;
+
+private:
+    HANDLE process_ = nullptr;
+    char* remote_ = nullptr;
+};
 
 struct MessageBoxSeen
 {
