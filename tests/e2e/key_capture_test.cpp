@@ -45,14 +45,9 @@ bool ClickAt(POINT point)
 POINT TabItemOnScreen(HWND tab, int index)
 {
     RECT rect = {};
-    DWORD processId = 0;
-    GetWindowThreadProcessId(tab, &processId);
-    const HANDLE process = OpenProcess(PROCESS_VM_OPERATION | PROCESS_VM_READ, FALSE, processId);
-    void* lent = VirtualAllocEx(process, nullptr, sizeof rect, MEM_COMMIT, PAGE_READWRITE);
-    if (SendMessageA(tab, TCM_GETITEMRECT, index, reinterpret_cast<LPARAM>(lent)) != 0)
-        ReadProcessMemory(process, lent, &rect, sizeof rect, nullptr);
-    VirtualFreeEx(process, lent, 0, MEM_RELEASE);
-    CloseHandle(process);
+    const e2e::LentMemory lent(tab, sizeof rect);
+    if (SendMessageA(tab, TCM_GETITEMRECT, index, reinterpret_cast<LPARAM>(lent.Remote())) != 0)
+        lent.Read(&rect, sizeof rect);
     MapWindowPoints(tab, nullptr, reinterpret_cast<POINT*>(&rect), 2);
     return {rect.left + std::min<LONG>(12, (rect.right - rect.left) / 2),
             (rect.top + rect.bottom) / 2};

@@ -34,26 +34,16 @@ std::string WindowText(HWND window)
 namespace
 {
 
-// A list's line by its index, through `lengthMessage` and `textMessage`.
-std::wstring ItemText(HWND list, UINT lengthMessage, UINT textMessage, WPARAM index)
-{
-    const LRESULT length = SendMessageW(list, lengthMessage, index, 0);
-    std::wstring text(static_cast<std::size_t>(length > 0 ? length : 0) + 1, L'\0');
-    SendMessageW(list, textMessage, index, reinterpret_cast<LPARAM>(text.data()));
-    return text.c_str();
-}
-
 // A tab's item text: the item and its text are lent from the tool.
 std::wstring TabItemText(HWND tab, int index)
 {
-    constexpr int kCapacity = 128;
-    LentMemory lent(tab, sizeof(TCITEMW) + kCapacity * sizeof(wchar_t));
+    wchar_t text[128] = {};
+    LentMemory lent(tab, sizeof(TCITEMW) + sizeof text);
     TCITEMW item = {};
     item.mask = TCIF_TEXT;
     item.pszText = reinterpret_cast<wchar_t*>(lent.Remote() + sizeof item);
-    item.cchTextMax = kCapacity;
+    item.cchTextMax = std::size(text) - 1;
     lent.Write(&item, sizeof item);
-    wchar_t text[kCapacity] = {};
     if (SendMessageW(tab, TCM_GETITEMW, index, reinterpret_cast<LPARAM>(lent.Remote())) != 0)
         lent.Read(text, sizeof text - sizeof(wchar_t), sizeof item);
     return text;
@@ -61,28 +51,22 @@ std::wstring TabItemText(HWND tab, int index)
 
 std::vector<std::wstring> TextsOf(HWND control, const std::wstring& kind)
 {
+    // The messages that count, measure and read a list's lines.
+    const bool combo = kind == L"ComboBox";
+    const UINT count = combo ? CB_GETCOUNT : LB_GETCOUNT;
+    const UINT length = combo ? CB_GETLBTEXTLEN : LB_GETTEXTLEN;
+    const UINT read = combo ? CB_GETLBTEXT : LB_GETTEXT;
     std::vector<std::wstring> texts;
-    if (kind == L"ComboBox")
-    {
-        const LRESULT count = SendMessageW(control, CB_GETCOUNT, 0, 0);
-        for (LRESULT index = 0; index < count; ++index)
-            texts.push_back(ItemText(control, CB_GETLBTEXTLEN, CB_GETLBTEXT, index));
-    }
-    else if (kind == L"ListBox")
-    {
-        const LRESULT count = SendMessageW(control, LB_GETCOUNT, 0, 0);
-        for (LRESULT index = 0; index < count; ++index)
-            texts.push_back(ItemText(control, LB_GETTEXTLEN, LB_GETTEXT, index));
-    }
-    else if (kind == WC_TABCONTROLW)
-    {
-        const auto count = static_cast<int>(SendMessageW(control, TCM_GETITEMCOUNT, 0, 0));
-        for (int index = 0; index < count; ++index)
-            texts.push_back(TabItemText(control, index));
-    }
-    else if (kind == L"Static" || kind == L"Button" || kind == L"Edit")
-    {
+    if (kind == L"Static" || kind == L"Button" || kind == L"Edit")
         texts.push_back(WideText(control));
+    for (int index = 0; kind == WC_TABCONTROLW && index < TabCtrl_GetItemCount(control); ++index)
+        texts.push_back(TabItemText(control, index));
+    for (LRESULT index = 0;
+         (combo || kind == L"ListBox") && index < SendMessageW(control, count, 0, 0); ++index)
+    {
+        std::wstring text(SendMessageW(control, length, index, 0) + 1, L'\0');
+        SendMessageW(control, read, index, reinterpret_cast<LPARAM>(text.data()));
+        texts.push_back(text.c_str());
     }
     return texts;
 }

@@ -1,5 +1,5 @@
 // How the pages are wired to the record: each control shows its field at
-// start and writes it when the user changes it; and every page fits its tab.
+// start and writes it when the user changes it.
 #include "resources/resource.h"
 #include "tests/gui/gui_harness.h"
 
@@ -120,27 +120,5 @@ TEST(Pages, EachControlShowsItsFieldAtStartAndWritesItWhenChanged)
     {
         Change(tool.PageWindow(wiring.page), wiring);
         EXPECT_EQ(wiring.field(*tool.Record()).Get(), kValues[wiring.kind][1]) << wiring.id;
-    }
-}
-
-TEST(Pages, EveryVisibleControlOfEveryPageLiesInsideItsTab)
-{
-    RunningTool tool;
-    for (int index = 0; index < kPageCount + kKeyPageCount; ++index)
-    {
-        const bool keyPage = index >= kPageCount;
-        const HWND page = keyPage ? tool.KeyPageWindow(index - kPageCount) : tool.PageWindow(index);
-        const HWND tab = keyPage ? tool.KeyTab() : tool.MainTab();
-        RECT inside, rect, both;
-        GetWindowRect(tab, &inside);
-        for (HWND control = GetWindow(page, GW_CHILD); control;
-             control = GetWindow(control, GW_HWNDNEXT))
-        {
-            GetWindowRect(control, &rect);
-            UnionRect(&both, &inside, &rect);
-            EXPECT_TRUE((GetWindowLongPtrA(control, GWL_STYLE) & WS_VISIBLE) == 0 ||
-                        EqualRect(&both, &inside))
-                << "control " << GetDlgCtrlID(control) << " of page " << index;
-        }
     }
 }
