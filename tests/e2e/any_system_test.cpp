@@ -1,4 +1,4 @@
-// VEKConfig.exe on any player's system. These black-box tests run twice:
+// VEKConfig.exe on any player's system. The black-box tests run twice:
 // under the Japanese locale, where this test writes down every text the tool
 // shows, and under an English one (code page 1252, as Western Windows and
 // Proton have it), where every text must read the same.
@@ -10,7 +10,6 @@
 #include "tests/support/temp_folder.h"
 
 #include <algorithm>
-#include <commctrl.h>
 #include <filesystem>
 #include <fstream>
 #include <gtest/gtest.h>
@@ -151,60 +150,4 @@ TEST(AnySystem, TypedTextIsKeptInCodePage932AndPathsInTheSystemsCodePage)
                                 rows[2].musicPath};
     for (std::size_t i = 0; i < std::size(typed); ++i)
         EXPECT_EQ(held[i], kept(typed[i])) << typed[i].id;
-}
-
-TEST(AnySystem, At150PercentEveryControlLiesInsideItsPageAndEveryPageInsideItsTab)
-{
-    // Wine reads the scale at each process's start; the prefix has none of
-    // its own, so it is taken away again afterwards.
-    HKEY desktop = nullptr;
-    RegCreateKeyExW(HKEY_CURRENT_USER, L"Control Panel\\Desktop", 0, nullptr, 0, KEY_SET_VALUE,
-                    nullptr, &desktop, nullptr);
-    const DWORD dpi = 144;
-    RegSetValueExW(desktop, L"LogPixels", 0, REG_DWORD, reinterpret_cast<const BYTE*>(&dpi),
-                   sizeof dpi);
-    testing_support::TempSaveFolder folder;
-    e2e::ToolProcess tool;
-    const HWND dialog = ReadyDialog(tool);
-    RegDeleteValueW(desktop, L"LogPixels");
-    RegCloseKey(desktop);
-    ASSERT_NE(dialog, nullptr);
-
-    const auto inside = [](HWND window, RECT outer)
-    {
-        RECT rect = {}, both = {};
-        GetWindowRect(window, &rect);
-        UnionRect(&both, &rect, &outer);
-        return EqualRect(&both, &outer) != FALSE;
-    };
-    const HWND keyTab = e2e::FindControl(dialog, IDC_KEY_TAB);
-    int pages = 0;
-    for (const HWND tab : {e2e::FindControl(dialog, IDC_MAIN_TAB), keyTab})
-    {
-        // The tab's client area less its tabs, worked out in the tool.
-        RECT area = {};
-        GetClientRect(tab, &area);
-        e2e::LentMemory lent(tab, sizeof area);
-        lent.Write(&area, sizeof area);
-        SendMessageW(tab, TCM_ADJUSTRECT, FALSE, reinterpret_cast<LPARAM>(lent.Remote()));
-        lent.Read(&area, sizeof area);
-        MapWindowPoints(tab, nullptr, reinterpret_cast<POINT*>(&area), 2);
-        EXPECT_GT(area.bottom - area.top, 300) << "the dialog's units follow the scale";
-        // The key sub-pages are children of the page that holds their tab.
-        for (HWND page = GetWindow(tab == keyTab ? GetParent(keyTab) : tab, GW_CHILD); page;
-             page = GetWindow(page, GW_HWNDNEXT))
-        {
-            if (page == keyTab)
-                continue;
-            const int index = pages++;
-            EXPECT_TRUE(inside(page, area)) << "page " << index;
-            RECT pageRect = {};
-            GetWindowRect(page, &pageRect);
-            for (HWND control = GetWindow(page, GW_CHILD); control;
-                 control = GetWindow(control, GW_HWNDNEXT))
-                EXPECT_TRUE(inside(control, pageRect))
-                    << "control " << GetDlgCtrlID(control) << " of page " << index;
-        }
-    }
-    EXPECT_EQ(pages, 9);
 }

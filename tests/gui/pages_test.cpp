@@ -1,5 +1,5 @@
 // How the pages are wired to the record: each control shows its field at
-// start and writes it when the user changes it.
+// start and writes it when the user changes it; and every page fits its tab.
 #include "resources/resource.h"
 #include "tests/gui/gui_harness.h"
 
@@ -120,5 +120,35 @@ TEST(Pages, EachControlShowsItsFieldAtStartAndWritesItWhenChanged)
     {
         Change(tool.PageWindow(wiring.page), wiring);
         EXPECT_EQ(wiring.field(*tool.Record()).Get(), kValues[wiring.kind][1]) << wiring.id;
+    }
+}
+
+// Run at 96 dpi and again at 144 (150 %): whatever the scale, every control
+// lies inside its page and every page inside its tab's display area.
+TEST(Pages, EveryControlLiesInsideItsPageAndEveryPageInsideItsTab)
+{
+    RunningTool tool;
+    const auto inside = [](HWND window, RECT outer)
+    {
+        RECT rect, both;
+        GetWindowRect(window, &rect);
+        UnionRect(&both, &rect, &outer);
+        return EqualRect(&both, &outer) != FALSE;
+    };
+    for (int index = 0; index < kPageCount + kKeyPageCount; ++index)
+    {
+        const bool keyPage = index >= kPageCount;
+        const HWND page = keyPage ? tool.KeyPageWindow(index - kPageCount) : tool.PageWindow(index);
+        const HWND tab = keyPage ? tool.KeyTab() : tool.MainTab();
+        RECT area, pageRect;
+        GetClientRect(tab, &area);
+        TabCtrl_AdjustRect(tab, FALSE, &area);
+        MapWindowPoints(tab, nullptr, reinterpret_cast<POINT*>(&area), 2);
+        EXPECT_TRUE(inside(page, area)) << "page " << index;
+        GetWindowRect(page, &pageRect);
+        for (HWND control = GetWindow(page, GW_CHILD); control;
+             control = GetWindow(control, GW_HWNDNEXT))
+            EXPECT_TRUE(inside(control, pageRect))
+                << "control " << GetDlgCtrlID(control) << " of page " << index;
     }
 }
