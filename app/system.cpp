@@ -103,7 +103,17 @@ bool CSystem::SetCurrentDir(const char* path)
     {
         GetModuleDir(directory_, sizeof directory_);
     }
-    return SetCurrentDirectoryA(directory_) != 0;
+    directoryWide_ = base::WideFromAnsi(directory_);
+    if (path == nullptr)
+    {
+        // Read wide: a folder whose name the system's ANSI code page cannot
+        // hold would otherwise come back with '?' and never be entered.
+        wchar_t module[MAX_PATH] = {};
+        const DWORD length = GetModuleFileNameW(instance_, module, MAX_PATH);
+        directoryWide_.assign(module, length < MAX_PATH ? length : 0);
+        directoryWide_.erase(directoryWide_.find_last_of(L'\\') + 1);
+    }
+    return SetCurrentDirectoryW(directoryWide_.c_str()) != 0;
 }
 
 CSystem::FileChoice CSystem::OpenFileDialog(char* file, const char* title, const char* filter,
@@ -130,7 +140,7 @@ CSystem::FileChoice CSystem::OpenFileDialog(char* file, const char* title, const
     dialog.lpstrDefExt = extension.c_str();
     const BOOL chosen = GetOpenFileNameW(&dialog);
     // Browsing may have moved the current directory away from the program's.
-    SetCurrentDirectoryA(directory_);
+    SetCurrentDirectoryW(directoryWide_.c_str());
     if (!chosen)
         return FileChoice::Cancelled;
     const std::optional<std::string> path = base::AnsiFrom(chosenPath.c_str());

@@ -3,6 +3,7 @@
 #include "base/win32.h"
 
 #include <cstdint>
+#include <string>
 
 // The window object: owns the tool's one top-level window (the main dialog),
 // remembers the program's directory and opens the file-open dialog.
@@ -51,6 +52,7 @@ private:
     HWND window_;
     char* name_;
     char directory_[MAX_PATH];
+    std::wstring directoryWide_;
     std::uint32_t width_;
     std::uint32_t height_;
     std::uint32_t style_;

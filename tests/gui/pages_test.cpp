@@ -127,6 +127,9 @@ TEST(Pages, EachControlShowsItsFieldAtStartAndWritesItWhenChanged)
 // lies inside its page and every page inside its tab's display area.
 TEST(Pages, EveryControlLiesInsideItsPageAndEveryPageInsideItsTab)
 {
+    char dpi[8] = "96"; // tools/wine-run's scale
+    GetEnvironmentVariableA("VEK_WINE_DPI", dpi, sizeof dpi);
+    EXPECT_EQ(GetDeviceCaps(GetDC(nullptr), LOGPIXELSY), std::atoi(dpi));
     RunningTool tool;
     const auto inside = [](HWND window, RECT outer)
     {
