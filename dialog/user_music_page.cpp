@@ -74,7 +74,12 @@ void TakeDroppedFile(HDROP drop, HWND edit, char (&field)[config::kPathCapacity]
 // stored path again.
 void StoreEditText(HWND edit, char (&field)[config::kPathCapacity])
 {
-    const std::optional<std::string> path = base::AnsiFrom(base::WindowTextWide(edit));
+    const std::wstring text = base::WindowTextWide(edit);
+    // The stored path shown back (at start, or after a refusal) is kept as
+    // it is, byte for byte, whatever the code page makes of it.
+    if (text == base::WideFromAnsi(config::FieldText(field)))
+        return;
+    const std::optional<std::string> path = base::AnsiFrom(text);
     if (path)
     {
         config::StoreFieldText(field, config::kPathTextLimit, *path);
