@@ -5,6 +5,7 @@
 
 #include "app/config_application.h"
 #include "app/system.h"
+#include "base/window_text_win32.h"
 #include "tests/support/temp_folder.h"
 
 #include <commctrl.h>
@@ -17,11 +18,10 @@
 namespace gui
 {
 
+// Read wide and given in code page 932, whatever the system's code page.
 inline std::string ControlText(HWND dialog, int id)
 {
-    char text[1024] = {};
-    GetDlgItemTextA(dialog, id, text, sizeof text);
-    return text;
+    return base::WindowText932(GetDlgItem(dialog, id));
 }
 
 // A CBT hook on the test's thread for the scope. A later hook runs first.
@@ -42,9 +42,7 @@ inline LRESULT CALLBACK AnswerMessageBox(int code, WPARAM wParam, LPARAM lParam)
     const HWND box = reinterpret_cast<HWND>(wParam);
     if (code == HCBT_ACTIVATE && GetDlgItem(box, 0xFFFF) != nullptr)
     {
-        char caption[256] = {};
-        GetWindowTextA(box, caption, sizeof caption);
-        messageBoxes.push_back({caption, ControlText(box, 0xFFFF)});
+        messageBoxes.push_back({base::WindowText932(box), ControlText(box, 0xFFFF)});
         PostMessageA(box, WM_COMMAND, IDOK, 0);
     }
     return CallNextHookEx(nullptr, code, wParam, lParam);

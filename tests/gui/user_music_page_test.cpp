@@ -52,24 +52,37 @@ TEST(UserMusicPage, ADropTheCheckAndBrowsingEachServeTheirRow)
     const config::UserBgmRow& row = tool.Record()->UserBgm()->rows[kRow];
 
     // A drop as the shell hands it: DROPFILES, then names ending in zeros.
+    const auto dropOn = [&](int edit, const void* names, std::size_t size, BOOL wide)
+    {
+        const HGLOBAL drop = GlobalAlloc(GHND, sizeof(DROPFILES) + size);
+        auto* header = static_cast<DROPFILES*>(GlobalLock(drop));
+        *header = {sizeof(DROPFILES), {}, FALSE, wide};
+        std::memcpy(header + 1, names, size);
+        GlobalUnlock(drop);
+        SendDlgItemMessageA(page, edit, WM_DROPFILES, reinterpret_cast<WPARAM>(drop), 0);
+        EXPECT_EQ(GlobalSize(drop), 0u) << "the drop was not released";
+    };
     const std::string names = music + '\0' + folder.File("b.wav") + '\0' + '\0';
-    const HGLOBAL drop = GlobalAlloc(GHND, sizeof(DROPFILES) + names.size());
-    auto* header = static_cast<DROPFILES*>(GlobalLock(drop));
-    header->pFiles = sizeof(DROPFILES);
-    std::memcpy(header + 1, names.data(), names.size());
-    GlobalUnlock(drop);
-    SendDlgItemMessageA(page, kMusicEdit, WM_DROPFILES, reinterpret_cast<WPARAM>(drop), 0);
+    dropOn(kMusicEdit, names.data(), names.size(), FALSE);
     EXPECT_EQ(config::FieldText(row.musicPath), music) << "the first file of the drop";
     EXPECT_EQ(gui::ControlText(page, kMusicEdit), music);
-    EXPECT_EQ(GlobalSize(drop), 0u) << "the drop was not released";
 
     gui::messageBoxes.clear();
     {
         const gui::CbtHook answering(gui::AnswerMessageBox);
+        // A path the system's code page cannot hold (Hangul, on a Japanese
+        // or a Western system) is refused.
+        const wchar_t refused[] = L"C:\\\uD55C.wav\0";
+        dropOn(kMusicEdit, refused, sizeof refused, TRUE);
         gui::Notify(page, IDC_MUSIC_CHECK_FIRST + IDC_MUSIC_ROW_STEP * kRow);
     }
-    // The row's music was read; it has no tension file.
-    EXPECT_EQ(gui::messageBoxes, (decltype(gui::messageBoxes){{"", "ファイルが開けません!!\n"}}));
+    EXPECT_EQ(config::FieldText(row.musicPath), music);
+    // The refusal, then the check: the row's music was read; it has no
+    // tension file.
+    ASSERT_EQ(gui::messageBoxes.size(), 2u);
+    EXPECT_EQ(gui::messageBoxes[0].second.substr(0, 12), "このパスには");
+    EXPECT_EQ(gui::messageBoxes[1],
+              (std::pair<std::string, std::string>{"", "ファイルが開けません!!\n"}));
 
     const std::filesystem::path programFolder = std::filesystem::current_path();
     std::filesystem::current_path(folder.Path());
