@@ -25,18 +25,6 @@ bool JapaneseRun()
     return !english;
 }
 
-// The main dialog once every page is made and filled: a message sent from
-// here is taken only by the tool's message loop, which starts after that.
-HWND ReadyDialog(e2e::ToolProcess& tool)
-{
-    const HWND dialog = tool.MainDialog();
-    const int lastMade = IDC_RADIO_CHAT_TO_ALL_FIRST + IDC_RADIO_CHAT_ROW_STEP * 11;
-    if (dialog == nullptr || !e2e::WaitFor([&] { return e2e::FindControl(dialog, lastMade); }))
-        return nullptr;
-    SendMessageW(dialog, WM_NULL, 0, 0);
-    return dialog;
-}
-
 } // namespace
 
 TEST(AnySystem, EveryTextReadsAsInTheJapaneseRun)
@@ -51,11 +39,10 @@ TEST(AnySystem, EveryTextReadsAsInTheJapaneseRun)
     config::StoreFieldText(record.RadioChat()->entries[0].text, config::kRadioChatTextLimit,
                            "了解！援護する");
     config::StoreFieldText(record.Network()->lobbyId, config::kIdTextLimit, "ＶＥＫ－ＩＤ");
-    std::filesystem::create_directories(folder.SaveDirectory());
-    testing_support::WriteBytes(folder.SettingsFile(), record.SaveToBytes());
+    folder.WriteSettings(record.SaveToBytes());
 
     e2e::ToolProcess tool;
-    const HWND dialog = ReadyDialog(tool);
+    const HWND dialog = tool.MainDialog();
     ASSERT_NE(dialog, nullptr);
     std::wstring texts = e2e::ShownTexts(dialog);
     PostMessageW(e2e::FindControl(dialog, IDC_CONNECT_ADD), BM_CLICK, 0, 0);
@@ -106,7 +93,7 @@ TEST(AnySystem, TypedTextIsKeptInCodePage932AndPathsInTheSystemsCodePage)
 
     testing_support::TempSaveFolder folder;
     e2e::ToolProcess tool;
-    const HWND dialog = ReadyDialog(tool);
+    const HWND dialog = tool.MainDialog();
     ASSERT_NE(dialog, nullptr);
     for (const Typed& t : typed)
     {

@@ -13,21 +13,17 @@
 namespace
 {
 
-// Types an address into the IP entry dialog and presses OK.
-void Type(HWND entry, std::array<const char*, 4> octets)
+// Types an address into the IP entry dialog and presses OK; with an add
+// button, presses it first. Returns the entry dialog.
+HWND Enter(e2e::ToolProcess& tool, HWND dialog, int add, std::array<const char*, 4> octets)
 {
+    if (add != 0)
+        PostMessageA(e2e::FindControl(dialog, add), BM_CLICK, 0, 0);
+    const HWND entry = tool.DialogWith(IDC_IP_OCTET1);
     for (const int id : {IDC_IP_OCTET1, IDC_IP_OCTET2, IDC_IP_OCTET3, IDC_IP_OCTET4})
         SendDlgItemMessageA(entry, id, WM_SETTEXT, 0,
                             reinterpret_cast<LPARAM>(octets[id - IDC_IP_OCTET1]));
     e2e::PostCommand(entry, IDOK);
-}
-
-// Presses an add button and enters an address; returns the entry dialog.
-HWND Enter(e2e::ToolProcess& tool, HWND dialog, int add, std::array<const char*, 4> octets)
-{
-    PostMessageA(e2e::FindControl(dialog, add), BM_CLICK, 0, 0);
-    const HWND entry = tool.DialogWith(IDC_IP_OCTET1);
-    Type(entry, octets);
     return entry;
 }
 
@@ -48,14 +44,14 @@ TEST(IpEntry, ARefusedFieldKeepsTheDialogOkAddsTheAddressAndDeleteRemovesIt)
     testing_support::TempSaveFolder folder;
     e2e::ToolProcess tool;
     const HWND dialog = tool.MainDialog();
-    ASSERT_TRUE(e2e::WaitFor([&] { return e2e::FindControl(dialog, IDC_DENY_DELETE) != nullptr; }));
+    ASSERT_NE(dialog, nullptr);
     for (const int add : {IDC_ALLOW_ADD, IDC_DENY_ADD})
     {
         const HWND entry = Enter(tool, dialog, add, {"256", "7", "7", "7"});
         const e2e::MessageBoxSeen refusal = tool.AnswerMessageBox(IDOK);
         EXPECT_EQ(refusal.caption + ": " + refusal.text,
                   "Error: IPアドレスには0～255までの数字を入力してください。");
-        Type(entry, {"*", "7", "7", "7"});
+        EXPECT_EQ(Enter(tool, dialog, 0, {"*", "7", "7", "7"}), entry);
         EXPECT_TRUE(e2e::WaitFor([&] { return !IsWindow(entry); }));
     }
     SendMessageA(e2e::FindControl(dialog, IDC_DENY_LIST), LB_SETCURSEL, 0, 0);
@@ -77,15 +73,13 @@ TEST(IpEntry, ConnectLinesStayWithTheirSlotsInAFileWithFreeSlotsBetween)
     record.ResetAll();
     record.Network()->connectList[1] = {{"001", "001", "001", "001"}};
     record.Network()->connectList[3] = {{"003", "003", "003", "003"}};
-    std::filesystem::create_directories(folder.SaveDirectory());
-    testing_support::WriteBytes(folder.SettingsFile(), record.SaveToBytes());
+    folder.WriteSettings(record.SaveToBytes());
     e2e::ToolProcess tool;
     const HWND dialog = tool.MainDialog();
-    HWND list = nullptr;
-    ASSERT_TRUE(e2e::WaitFor([&] { return (list = e2e::FindControl(dialog, IDC_CONNECT_LIST)); }));
+    ASSERT_NE(dialog, nullptr);
+    const HWND list = e2e::FindControl(dialog, IDC_CONNECT_LIST);
     const auto lines = [&] { return SendMessageA(list, LB_GETCOUNT, 0, 0); };
-    // The page is filled from the file before anything is clicked.
-    ASSERT_TRUE(e2e::WaitFor([&] { return lines() == 2; }));
+    ASSERT_EQ(lines(), 2);
 
     const HWND entry = Enter(tool, dialog, IDC_CONNECT_ADD, {"9", "9", "9", "9"});
     ASSERT_TRUE(e2e::WaitFor([&] { return !IsWindow(entry) && lines() == 3; }));

@@ -78,11 +78,6 @@ TEST(KeyCapture, PressingXOnActionFourteenTakesXFromActionSixteenAndSavesBoth)
     ASSERT_NE(dialog, nullptr);
     const auto edit = [&](int action)
     { return e2e::FindControl(dialog, IDC_KEYBOARD_EDIT_FIRST + action); };
-    // The dialog shows before its pages exist; the player list is filled last.
-    ASSERT_TRUE(e2e::WaitFor(
-        [&] {
-            return SendMessageA(e2e::FindControl(dialog, IDC_PAD_PLAYER), CB_GETCOUNT, 0, 0) == 4;
-        }));
     ASSERT_TRUE(ClickAt(TabItemOnScreen(GetDlgItem(dialog, IDC_MAIN_TAB), kKeyConfigTab)));
     ASSERT_TRUE(e2e::WaitFor([&] { return IsWindowVisible(edit(14)) != FALSE; }));
     ASSERT_TRUE(ClickAt(CentreOf(edit(14))));

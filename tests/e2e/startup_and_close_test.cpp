@@ -47,8 +47,7 @@ TEST(Tool, RefusesANewerFileWithItsMessageAndExitCodeMinusOne)
     testing_support::TempSaveFolder folder;
     std::vector<std::uint8_t> newer = Defaults();
     ++newer[0]; // the version word, one above the tool's own
-    std::filesystem::create_directories(folder.SaveDirectory());
-    testing_support::WriteBytes(folder.SettingsFile(), newer);
+    folder.WriteSettings(newer);
 
     e2e::ToolProcess tool;
     const e2e::MessageBoxSeen refusal = tool.AnswerMessageBox(IDOK);

@@ -1,6 +1,7 @@
 #include "tests/e2e/tool_driver.h"
 
 #include "base/window_text_win32.h"
+#include "resources/resource.h"
 
 #include <commctrl.h>
 #include <cstring>
@@ -71,6 +72,24 @@ std::vector<std::wstring> TextsOf(HWND control, const std::wstring& kind)
     return texts;
 }
 
+// The first window `enumerate` passes that `matches`; null if none.
+template <typename Enumerate>
+HWND FirstWindow(Enumerate enumerate, const std::function<bool(HWND)>& matches)
+{
+    std::pair<const std::function<bool(HWND)>*, HWND> search{&matches, nullptr};
+    enumerate(
+        [](HWND window, LPARAM parameter) -> BOOL
+        {
+            auto* s =
+                reinterpret_cast<std::pair<const std::function<bool(HWND)>*, HWND>*>(parameter);
+            if ((*s->first)(window))
+                s->second = window;
+            return s->second == nullptr;
+        },
+        reinterpret_cast<LPARAM>(&search));
+    return search.second;
+}
+
 } // namespace
 
 std::wstring ShownTexts(HWND dialog)
@@ -94,18 +113,9 @@ std::wstring ShownTexts(HWND dialog)
 
 HWND FindControl(HWND dialog, int id)
 {
-    std::pair<int, HWND> search{id, nullptr};
-    EnumChildWindows(
-        dialog,
-        [](HWND window, LPARAM parameter) -> BOOL
-        {
-            auto* s = reinterpret_cast<std::pair<int, HWND>*>(parameter);
-            if (GetDlgCtrlID(window) == s->first)
-                s->second = window;
-            return s->second == nullptr;
-        },
-        reinterpret_cast<LPARAM>(&search));
-    return search.second;
+    return FirstWindow([&](WNDENUMPROC each, LPARAM search)
+                       { EnumChildWindows(dialog, each, search); },
+                       [id](HWND window) { return GetDlgCtrlID(window) == id; });
 }
 
 LentMemory::LentMemory(HWND window, std::size_t size)
@@ -159,52 +169,44 @@ ToolProcess::~ToolProcess()
     CloseHandle(process_.hProcess);
 }
 
-HWND ToolProcess::FindDialog(bool (*matches)(HWND dialog, int id), int id)
+HWND ToolProcess::FindDialog(const std::function<bool(HWND)>& matches)
 {
-    struct Search
+    const auto shown = [&](HWND window)
     {
-        DWORD processId;
-        bool (*matches)(HWND, int);
-        int id;
-        HWND found;
-    } search{process_.dwProcessId, matches, id, nullptr};
-    WaitFor(
-        [&]
-        {
-            EnumWindows(
-                [](HWND window, LPARAM parameter) -> BOOL
-                {
-                    auto* s = reinterpret_cast<Search*>(parameter);
-                    DWORD processId = 0;
-                    char className[16] = {};
-                    GetWindowThreadProcessId(window, &processId);
-                    GetClassNameA(window, className, sizeof className);
-                    if (processId == s->processId && IsWindowVisible(window) &&
-                        std::strcmp(className, "#32770") == 0 && s->matches(window, s->id))
-                        s->found = window;
-                    return s->found == nullptr;
-                },
-                reinterpret_cast<LPARAM>(&search));
-            return search.found != nullptr;
-        });
-    return search.found;
+        DWORD processId = 0;
+        char className[16] = {};
+        GetWindowThreadProcessId(window, &processId);
+        GetClassNameA(window, className, sizeof className);
+        return processId == process_.dwProcessId && IsWindowVisible(window) &&
+               std::strcmp(className, "#32770") == 0 && matches(window);
+    };
+    HWND found = nullptr;
+    WaitFor([&] { return (found = FirstWindow(EnumWindows, shown)) != nullptr; });
+    return found;
 }
 
 HWND ToolProcess::MainDialog()
 {
-    return FindDialog([](HWND dialog, int) { return GetDlgItem(dialog, 0xFFFF) == nullptr; });
+    const HWND dialog =
+        FindDialog([](HWND dialog) { return GetDlgItem(dialog, 0xFFFF) == nullptr; });
+    const int lastMade = IDC_RADIO_CHAT_TO_ALL_FIRST + IDC_RADIO_CHAT_ROW_STEP * 11;
+    if (dialog == nullptr || !WaitFor([&] { return FindControl(dialog, lastMade); }))
+        return nullptr;
+    // Taken only by the tool's message loop, which starts once every page is filled.
+    SendMessageW(dialog, WM_NULL, 0, 0);
+    return dialog;
 }
 
 HWND ToolProcess::DialogWith(int id)
 {
-    return FindDialog([](HWND dialog, int id) { return GetDlgItem(dialog, id) != nullptr; }, id);
+    return FindDialog([id](HWND dialog) { return GetDlgItem(dialog, id) != nullptr; });
 }
 
 MessageBoxSeen ToolProcess::AnswerMessageBox(int answer)
 {
     // A text of id 0xFFFF and no edit: the IP entry dialog's labels share the id.
     const HWND box = FindDialog(
-        [](HWND dialog, int)
+        [](HWND dialog)
         {
             return GetDlgItem(dialog, 0xFFFF) != nullptr &&
                    FindWindowExA(dialog, nullptr, "Edit", nullptr) == nullptr;

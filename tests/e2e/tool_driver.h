@@ -71,7 +71,7 @@ public:
     ToolProcess(const ToolProcess&) = delete;
     ToolProcess& operator=(const ToolProcess&) = delete;
 
-    // The main dialog once it is shown; null after the timeout.
+    // The main dialog once its pages are made and filled; null after the timeout.
     HWND MainDialog();
     // A shown dialog of the tool holding a control of id `id`.
     HWND DialogWith(int id);
@@ -82,7 +82,7 @@ public:
 
 private:
     // A shown dialog of the tool that `matches`; null after the timeout.
-    HWND FindDialog(bool (*matches)(HWND dialog, int id), int id = 0);
+    HWND FindDialog(const std::function<bool(HWND)>& matches);
 
     PROCESS_INFORMATION process_{};
 };

@@ -11,15 +11,13 @@
 TEST(Vekcfg, AValueSetOnTheCommandLineShowsOnTheToolsPage)
 {
     testing_support::TempSaveFolder folder;
-    std::filesystem::create_directories(folder.SaveDirectory());
     config::CSaveConfig record;
     record.ResetAll();
-    testing_support::WriteBytes(folder.SettingsFile(), record.SaveToBytes());
+    folder.WriteSettings(record.SaveToBytes());
     ASSERT_EQ(e2e::ToolProcess("vekcfg.exe", "set graphics.screenSize=1280x960").ExitCode(), 0u);
 
     e2e::ToolProcess tool;
     const HWND dialog = tool.MainDialog();
     ASSERT_NE(dialog, nullptr);
-    EXPECT_TRUE(e2e::WaitFor(
-        [&] { return e2e::WindowText(e2e::FindControl(dialog, IDC_SCREEN_SIZE)) == "1280×960"; }));
+    EXPECT_EQ(e2e::WindowText(e2e::FindControl(dialog, IDC_SCREEN_SIZE)), "1280×960");
 }

@@ -59,8 +59,7 @@ public:
         record.ResetAll();
         if (edit)
             edit(record);
-        std::filesystem::create_directories(folder_.SaveDirectory());
-        testing_support::WriteBytes(folder_.SettingsFile(), record.SaveToBytes());
+        folder_.WriteSettings(record.SaveToBytes());
         SetApplication(this);
         EXPECT_TRUE(Init(GetModuleHandleA(nullptr), AppWindowProc));
     }

@@ -55,4 +55,10 @@ void WriteBytes(const std::string& path, const std::vector<std::uint8_t>& bytes)
     out.write(reinterpret_cast<const char*>(bytes.data()), std::streamsize(bytes.size()));
 }
 
+void TempSaveFolder::WriteSettings(const std::vector<std::uint8_t>& bytes) const
+{
+    std::filesystem::create_directories(SaveDirectory());
+    WriteBytes(SettingsFile(), bytes);
+}
+
 } // namespace testing_support

@@ -37,6 +37,8 @@ public:
     std::filesystem::path SaveDirectory() const { return root_.Path() / "Tolvenik" / "VEK"; }
     std::string SettingsFile() const { return (SaveDirectory() / "GameConfig.dat").string(); }
     const TempFolder& Root() const { return root_; }
+    // Writes the settings file, making its folder first.
+    void WriteSettings(const std::vector<std::uint8_t>& bytes) const;
 
 private:
     TempFolder root_;
