@@ -31,7 +31,8 @@ FormatBlock Plain(WORD tag, WORD channels, DWORD rate, WORD bits)
     return block;
 }
 
-FormatBlock Extensible(WORD bits, WORD validBits, const GUID& subFormat)
+FormatBlock Extensible(WORD bits = 16, WORD validBits = 16,
+                       const GUID& subFormat = KSDATAFORMAT_SUBTYPE_PCM)
 {
     FormatBlock block = Plain(WAVE_FORMAT_EXTENSIBLE, 2, 44100, bits);
     block.format.Format.cbSize = sizeof(WAVEFORMATEXTENSIBLE) - sizeof(WAVEFORMATEX);
@@ -47,15 +48,10 @@ template <typename Change> FormatBlock With(FormatBlock block, Change change)
     return block;
 }
 
-GUID AdpcmSubFormat()
-{
-    GUID adpcm = KSDATAFORMAT_SUBTYPE_PCM;
-    adpcm.Data1 = WAVE_FORMAT_ADPCM;
-    return adpcm;
-}
-
-// B-format surround: PCM samples, yet not the PCM sub-format, though its
-// GUID starts like it.
+// ADPCM as a sub-format; and B-format surround: PCM samples, yet not the
+// PCM sub-format, though its GUID starts like it.
+constexpr GUID kAdpcmSubFormat{
+    WAVE_FORMAT_ADPCM, 0x0000, 0x0010, {0x80, 0x00, 0x00, 0xAA, 0x00, 0x38, 0x9B, 0x71}};
 constexpr GUID kAmbisonicPcmSubFormat{
     0x00000001, 0x0721, 0x11D3, {0x86, 0x44, 0xC8, 0xC1, 0xCA, 0x00, 0x00, 0x00}};
 
@@ -72,36 +68,29 @@ TEST(DirectSoundFormats, TheStandInRefusesExactlyWhatDirectSoundRefuses)
         FormatBlock block;
         bool accepted;
     };
+    const FormatBlock pcm = Plain(WAVE_FORMAT_PCM, 2, 44100, 16);
     const Row rows[] = {
-        {"16-bit stereo PCM", Plain(WAVE_FORMAT_PCM, 2, 44100, 16), true},
+        {"16-bit stereo PCM", pcm, true},
         {"12-bit samples are not whole bytes", Plain(WAVE_FORMAT_PCM, 2, 44100, 12), false},
         {"a block align other than channels x bytes per sample",
-         With(Plain(WAVE_FORMAT_PCM, 2, 44100, 16), [](auto& f) { f.Format.nBlockAlign = 8; }),
-         false},
-        {"no bytes per second",
-         With(Plain(WAVE_FORMAT_PCM, 2, 44100, 16), [](auto& f) { f.Format.nAvgBytesPerSec = 0; }),
-         false},
-        {"any other bytes per second",
-         With(Plain(WAVE_FORMAT_PCM, 2, 44100, 16), [](auto& f) { f.Format.nAvgBytesPerSec = 1; }),
+         With(pcm, [](auto& f) { f.Format.nBlockAlign = 8; }), false},
+        {"no bytes per second", With(pcm, [](auto& f) { f.Format.nAvgBytesPerSec = 0; }), false},
+        {"any other bytes per second", With(pcm, [](auto& f) { f.Format.nAvgBytesPerSec = 1; }),
          true},
         {"a compressed format tag", Plain(WAVE_FORMAT_ADPCM, 2, 44100, 16), false},
         {"IEEE float samples of 64 bits", Plain(WAVE_FORMAT_IEEE_FLOAT, 2, 44100, 64), true},
         {"eight channels", Plain(WAVE_FORMAT_PCM, 8, 44100, 16), true},
         {"1 Hz, below DSBFREQUENCY_MIN", Plain(WAVE_FORMAT_PCM, 1, 1, 8), true},
         {"384000 Hz, above DSBFREQUENCY_MAX", Plain(WAVE_FORMAT_PCM, 2, 384000, 16), true},
-        {"extensible PCM of 24 valid bits in 32", Extensible(32, 24, KSDATAFORMAT_SUBTYPE_PCM),
-         true},
+        {"extensible PCM of 24 valid bits in 32", Extensible(32, 24), true},
         {"extensible without its extra bytes",
-         With(Extensible(16, 16, KSDATAFORMAT_SUBTYPE_PCM), [](auto& f) { f.Format.cbSize = 0; }),
+         With(Extensible(), [](auto& f) { f.Format.cbSize = 0; }), false},
+        {"extensible of a sub-format other than PCM and float", Extensible(16, 16, kAdpcmSubFormat),
          false},
-        {"extensible of a sub-format other than PCM and float",
-         Extensible(16, 16, AdpcmSubFormat()), false},
         {"extensible of Ambisonic B-format", Extensible(16, 16, kAmbisonicPcmSubFormat), false},
-        {"extensible with more valid bits than bits", Extensible(16, 17, KSDATAFORMAT_SUBTYPE_PCM),
-         false},
+        {"extensible with more valid bits than bits", Extensible(16, 17), false},
         {"extensible with extra bytes beyond its own",
-         With(Extensible(16, 16, KSDATAFORMAT_SUBTYPE_PCM), [](auto& f) { f.Format.cbSize = 23; }),
-         false},
+         With(Extensible(), [](auto& f) { f.Format.cbSize = 23; }), false},
         // Wine's allowance for writers that count the whole structure.
         {"extensible counting its whole structure as extra bytes",
          With(Extensible(32, 32, KSDATAFORMAT_SUBTYPE_IEEE_FLOAT),
