@@ -5,6 +5,7 @@
 #include "tests/support/sound_device_fixture.h"
 
 #include <gtest/gtest.h>
+#include <tuple>
 #include <vector>
 
 namespace
@@ -62,20 +63,15 @@ constexpr GUID kAmbisonicPcmSubFormat{
 // Windows documents of it: docs/reliability.md).
 TEST(DirectSoundFormats, TheStandInRefusesExactlyWhatDirectSoundRefuses)
 {
-    struct Row
-    {
-        const char* protects;
-        FormatBlock block;
-        bool accepted;
-    };
-    const FormatBlock pcm = Plain(WAVE_FORMAT_PCM, 2, 44100, 16);
-    const Row rows[] = {
-        {"16-bit stereo PCM", pcm, true},
+    const FormatBlock pcm16 = Plain(WAVE_FORMAT_PCM, 2, 44100, 16);
+    // What the row protects, the format and whether both accept it.
+    const std::tuple<const char*, FormatBlock, bool> rows[] = {
+        {"16-bit stereo PCM", pcm16, true},
         {"12-bit samples are not whole bytes", Plain(WAVE_FORMAT_PCM, 2, 44100, 12), false},
         {"a block align other than channels x bytes per sample",
-         With(pcm, [](auto& f) { f.Format.nBlockAlign = 8; }), false},
-        {"no bytes per second", With(pcm, [](auto& f) { f.Format.nAvgBytesPerSec = 0; }), false},
-        {"any other bytes per second", With(pcm, [](auto& f) { f.Format.nAvgBytesPerSec = 1; }),
+         With(pcm16, [](auto& f) { f.Format.nBlockAlign = 8; }), false},
+        {"no bytes per second", With(pcm16, [](auto& f) { f.Format.nAvgBytesPerSec = 0; }), false},
+        {"any other bytes per second", With(pcm16, [](auto& f) { f.Format.nAvgBytesPerSec = 1; }),
          true},
         {"a compressed format tag", Plain(WAVE_FORMAT_ADPCM, 2, 44100, 16), false},
         {"IEEE float samples of 64 bits", Plain(WAVE_FORMAT_IEEE_FLOAT, 2, 44100, 64), true},
@@ -99,16 +95,15 @@ TEST(DirectSoundFormats, TheStandInRefusesExactlyWhatDirectSoundRefuses)
     };
     testing_support::ScopedSoundDevice device;
     ASSERT_TRUE(device.Ready());
-    std::vector<std::uint8_t> pcm(1024);
-    for (const Row& row : rows)
+    std::vector<std::uint8_t> samples(1024);
+    for (const auto& [protects, block, accepted] : rows)
     {
-        const auto& format = reinterpret_cast<const sound::WaveFormat&>(row.block);
-        std::uint8_t* data = pcm.data();
+        const auto& format = reinterpret_cast<const sound::WaveFormat&>(block);
+        std::uint8_t* data = samples.data();
         sound::DeviceBuffer* buffer = sound::device::CreateStaticBuffer(
-            format, sound::kCapsStatic, data, static_cast<std::uint32_t>(pcm.size()));
-        EXPECT_EQ(buffer != nullptr, row.accepted) << "DirectSound: " << row.protects;
-        EXPECT_EQ(sound::IsPlayableFormat(format), row.accepted)
-            << "IsPlayableFormat: " << row.protects;
+            format, sound::kCapsStatic, data, static_cast<std::uint32_t>(samples.size()));
+        EXPECT_EQ(buffer != nullptr, accepted) << "DirectSound: " << protects;
+        EXPECT_EQ(sound::IsPlayableFormat(format), accepted) << "IsPlayableFormat: " << protects;
         if (buffer != nullptr)
             sound::device::Release(buffer);
     }

@@ -4,6 +4,7 @@
 
 #include <cstring>
 #include <gtest/gtest.h>
+#include <tuple>
 #include <utility>
 
 using sound::DecodedAudio;
@@ -34,13 +35,8 @@ TEST(RiffReader, FindsTheFormatAndTheDataWhereTheRulesPutThem)
     const Bytes ieeeFloat = FormatChunkBody(WaveSpec{.formatTag = 3});
     Bytes riffBeyondTheFile = Wave(pcm);
     std::memset(&riffBeyondTheFile[4], 0xFF, 4);
-    const struct
-    {
-        const char* what;
-        Bytes file;
-        WaveSpec format;
-        std::uint32_t dataBytes;
-    } cases[] = {
+    // What the file is, the file, the format read and the data bytes read.
+    const std::tuple<const char*, Bytes, WaveSpec, std::uint32_t> cases[] = {
         {"PCM", Wave(pcm), WaveSpec{}, 7},
         {"other chunks around, odd ones padded",
          RiffWriter()
@@ -59,17 +55,16 @@ TEST(RiffReader, FindsTheFormatAndTheDataWhereTheRulesPutThem)
         {"a non-PCM fmt chunk of 16 bytes has none",
          Wave(Bytes(ieeeFloat.begin(), ieeeFloat.begin() + 16)), WaveSpec{.formatTag = 3}, 7},
     };
-    for (const auto& c : cases)
+    for (const auto& [what, file, spec, dataBytes] : cases)
     {
         DecodedAudio audio;
-        ASSERT_TRUE(sound::ReadWaveFromMemory(c.file.data(), c.file.size(), &audio)) << c.what;
+        ASSERT_TRUE(sound::ReadWaveFromMemory(file.data(), file.size(), &audio)) << what;
         // The 16 bytes of the chunk, the count of extra bytes, the extra bytes.
-        Bytes block = FormatChunkBody(c.format);
-        block.resize(18 + c.format.extra.size());
+        Bytes block = FormatChunkBody(spec);
+        block.resize(18 + spec.extra.size());
         const auto* format = reinterpret_cast<const std::uint8_t*>(audio.format);
-        EXPECT_EQ(Bytes(format, format + sound::FormatBytes(*audio.format)), block) << c.what;
-        EXPECT_EQ(Bytes(audio.data, audio.data + audio.dataBytes), PatternBytes(c.dataBytes))
-            << c.what;
+        EXPECT_EQ(Bytes(format, format + sound::FormatBytes(*audio.format)), block) << what;
+        EXPECT_EQ(Bytes(audio.data, audio.data + audio.dataBytes), PatternBytes(dataBytes)) << what;
     }
 }
 
