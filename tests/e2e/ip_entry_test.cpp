@@ -27,21 +27,19 @@ HWND Enter(e2e::ToolProcess& tool, HWND dialog, int add, std::array<const char*,
     return entry;
 }
 
-config::CSaveConfig SaveAndClose(e2e::ToolProcess& tool, HWND dialog, const std::string& file)
-{
-    e2e::PostCommand(dialog, IDOK);
-    EXPECT_EQ(tool.AnswerMessageBox(IDYES).caption, "終了確認");
-    EXPECT_EQ(tool.ExitCode(), 0u);
-    config::CSaveConfig saved;
-    EXPECT_TRUE(saved.LoadFromPath(file.c_str()));
-    return saved;
-}
-
 } // namespace
 
-TEST(IpEntry, ARefusedFieldKeepsTheDialogOkAddsTheAddressAndDeleteRemovesIt)
+// A file written with free 接続 slots between filled ones: each line still
+// deletes its own slot; an all-zero address is listed but leaves its slot
+// free for the next.
+TEST(IpEntry, ARefusedFieldKeepsTheDialogAndLinesAreAddedAndDeletedWithTheirSlots)
 {
     testing_support::TempSaveFolder folder;
+    config::CSaveConfig record;
+    record.ResetAll();
+    record.Network()->connectList[1] = {{"001", "001", "001", "001"}};
+    record.Network()->connectList[3] = {{"003", "003", "003", "003"}};
+    folder.WriteSettings(record.SaveToBytes());
     e2e::ToolProcess tool;
     const HWND dialog = tool.MainDialog();
     ASSERT_NE(dialog, nullptr);
@@ -57,30 +55,9 @@ TEST(IpEntry, ARefusedFieldKeepsTheDialogOkAddsTheAddressAndDeleteRemovesIt)
     SendMessageA(e2e::FindControl(dialog, IDC_DENY_LIST), LB_SETCURSEL, 0, 0);
     PostMessageA(e2e::FindControl(dialog, IDC_DENY_DELETE), BM_CLICK, 0, 0);
 
-    const config::CSaveConfig saved = SaveAndClose(tool, dialog, folder.SettingsFile());
-    ASSERT_EQ(saved.Network()->allowCount, 1u);
-    EXPECT_EQ(config::ListedLine(*saved.GetAllowEntry(0)), "*.007.007.007");
-    EXPECT_EQ(saved.Network()->denyCount, 0u);
-}
-
-// A file written with free 接続 slots between filled ones: each line still
-// deletes its own slot; an all-zero address is listed but leaves its slot
-// free for the next.
-TEST(IpEntry, ConnectLinesStayWithTheirSlotsInAFileWithFreeSlotsBetween)
-{
-    testing_support::TempSaveFolder folder;
-    config::CSaveConfig record;
-    record.ResetAll();
-    record.Network()->connectList[1] = {{"001", "001", "001", "001"}};
-    record.Network()->connectList[3] = {{"003", "003", "003", "003"}};
-    folder.WriteSettings(record.SaveToBytes());
-    e2e::ToolProcess tool;
-    const HWND dialog = tool.MainDialog();
-    ASSERT_NE(dialog, nullptr);
     const HWND list = e2e::FindControl(dialog, IDC_CONNECT_LIST);
     const auto lines = [&] { return SendMessageA(list, LB_GETCOUNT, 0, 0); };
     ASSERT_EQ(lines(), 2);
-
     const HWND entry = Enter(tool, dialog, IDC_CONNECT_ADD, {"9", "9", "9", "9"});
     ASSERT_TRUE(e2e::WaitFor([&] { return !IsWindow(entry) && lines() == 3; }));
     SendMessageA(list, LB_SETCURSEL, 2, 0); // 3.3.3.3
@@ -91,7 +68,14 @@ TEST(IpEntry, ConnectLinesStayWithTheirSlotsInAFileWithFreeSlotsBetween)
     const HWND last = Enter(tool, dialog, IDC_CONNECT_ADD, {"5", "5", "5", "5"});
     ASSERT_TRUE(e2e::WaitFor([&] { return !IsWindow(last); }));
 
-    const config::CSaveConfig saved = SaveAndClose(tool, dialog, folder.SettingsFile());
+    e2e::PostCommand(dialog, IDOK);
+    EXPECT_EQ(tool.AnswerMessageBox(IDYES).caption, "終了確認");
+    EXPECT_EQ(tool.ExitCode(), 0u);
+    config::CSaveConfig saved;
+    ASSERT_TRUE(saved.LoadFromPath(folder.SettingsFile().c_str()));
+    ASSERT_EQ(saved.Network()->allowCount, 1u);
+    EXPECT_EQ(config::ListedLine(*saved.GetAllowEntry(0)), "*.007.007.007");
+    EXPECT_EQ(saved.Network()->denyCount, 0u);
     const config::IpEntry* slots = saved.Network()->connectList;
     EXPECT_EQ(config::ConnectLine(slots[0]) + " " + config::ConnectLine(slots[1]) + " " +
                   config::ConnectLine(slots[2]) + " " + config::ConnectLine(slots[3]),
