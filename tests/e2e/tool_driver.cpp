@@ -144,7 +144,7 @@ void LentMemory::Read(void* data, std::size_t size, std::size_t offset) const
     ReadProcessMemory(process_, remote_ + offset, data, size, nullptr);
 }
 
-ToolProcess::ToolProcess(const std::string& program, const std::string& arguments)
+ToolProcess::ToolProcess(const std::string& program)
 {
     char path[MAX_PATH] = {};
     GetModuleFileNameA(nullptr, path, sizeof path);
@@ -152,7 +152,7 @@ ToolProcess::ToolProcess(const std::string& program, const std::string& argument
     const std::string folder = program.find(':') == std::string::npos
                                    ? std::string(path, std::strrchr(path, '\\') + 1)
                                    : "";
-    std::string command = "\"" + folder + program + "\" " + arguments;
+    std::string command = "\"" + folder + program + "\"";
     STARTUPINFOA startup = {};
     startup.cb = sizeof startup;
     CreateProcessA(nullptr, command.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &startup,

@@ -65,8 +65,7 @@ class ToolProcess
 public:
     // Starts `program` (beside the test executable, unless a full path) with
     // the test's own environment: a TempSaveFolder made before gives it its TEMP.
-    explicit ToolProcess(const std::string& program = "VEKConfig.exe",
-                         const std::string& arguments = "");
+    explicit ToolProcess(const std::string& program = "VEKConfig.exe");
     ~ToolProcess();
     ToolProcess(const ToolProcess&) = delete;
     ToolProcess& operator=(const ToolProcess&) = delete;
