@@ -134,16 +134,6 @@ LentMemory::~LentMemory()
     CloseHandle(process_);
 }
 
-void LentMemory::Write(const void* data, std::size_t size, std::size_t offset)
-{
-    WriteProcessMemory(process_, remote_ + offset, data, size, nullptr);
-}
-
-void LentMemory::Read(void* data, std::size_t size, std::size_t offset) const
-{
-    ReadProcessMemory(process_, remote_ + offset, data, size, nullptr);
-}
-
 ToolProcess::ToolProcess(const std::string& program)
 {
     char path[MAX_PATH] = {};

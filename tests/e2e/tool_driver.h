@@ -45,8 +45,14 @@ public:
     LentMemory& operator=(const LentMemory&) = delete;
 
     char* Remote() const { return remote_; }
-    void Write(const void* data, std::size_t size, std::size_t offset = 0);
-    void Read(void* data, std::size_t size, std::size_t offset = 0) const;
+    void Write(const void* data, std::size_t size, std::size_t offset = 0)
+    {
+        WriteProcessMemory(process_, remote_ + offset, data, size, nullptr);
+    }
+    void Read(void* data, std::size_t size, std::size_t offset = 0) const
+    {
+        ReadProcessMemory(process_, remote_ + offset, data, size, nullptr);
+    }
 
 private:
     HANDLE process_ = nullptr;
