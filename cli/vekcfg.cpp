@@ -10,11 +10,12 @@
 #include "cli/settings_change.h"
 #include "cli/settings_file.h"
 #include "cli/settings_report.h"
-#include "cli/tension_draft.h"
 #include "cli/timeline_svg.h"
 #include "config/fixed_text.h"
 #include "config/save_config.h"
+#include "sound/loudness.h"
 #include "sound/sound_buffer.h"
+#include "tension/tension_draft.h"
 #include "tension/tension_file.h"
 
 #include <cerrno>
@@ -265,27 +266,18 @@ std::string Cp932Name(const std::string& utf8)
 
 int Draft(const Invocation& invocation)
 {
-    sound::CSound device;
-    if (!StartSoundDeviceOrComplain(device))
-        return kExitTrouble;
-    // The check's own decode gives the music's length, or the message the
-    // check shows for music it cannot open.
-    float length = 0.0f;
-    tension::CTextString message;
-    const tension::MusicCheckResult opened =
-        tension::CheckMusicRow(invocation.musicPath.c_str(), "", &message,
-                               [&length](const tension::MusicCheckInspection& seen)
-                               {
-                                   if (seen.music != nullptr)
-                                       length = seen.music->GetLength();
-                               });
-    if (opened == tension::MusicCheckResult::MusicUnreadable)
+    // One decode gives the music's length and its loudness, measured while
+    // it decodes; music the check cannot open gets the check's message.
+    sound::MusicMeasure music;
+    if (!sound::MeasureMusic(invocation.musicPath.c_str(), &music))
     {
-        WriteConsoleText(stderr, Utf8FromCp932(message.CStr()) + "\n");
+        WriteConsoleText(stderr, Utf8FromCp932(tension::kMusicUnreadableMessage) + "\n");
         return kExitCheckFailed;
     }
+    const float length = music.length;
     const std::string text =
-        DraftTension(DraftName(Cp932Name(Utf8FromNative(invocation.musicPath))), length);
+        tension::DraftTension(tension::DraftName(Cp932Name(Utf8FromNative(invocation.musicPath))),
+                              length, music.loudness);
     // What the check makes of the draft: music too short or too long gets
     // the check's own messages.
     tension::CTensionFile draft;

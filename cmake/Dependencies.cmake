@@ -31,3 +31,18 @@ else()
   add_library(vek_vorbis INTERFACE)
   target_link_libraries(vek_vorbis INTERFACE PkgConfig::VORBIS)
 endif()
+
+# libebur128 (loudness): Debian's natively; for Windows the static library
+# that tools/setup-deps builds from Debian's source package into .deps/mingw.
+if(WIN32)
+  if(NOT EXISTS ${VEK_MINGW_DEPS}/lib/libebur128.a)
+    message(FATAL_ERROR "libebur128 for MinGW is missing under ${VEK_MINGW_DEPS}: run tools/setup-deps")
+  endif()
+  add_library(vek_ebur128 INTERFACE)
+  target_include_directories(vek_ebur128 INTERFACE ${VEK_MINGW_DEPS}/include)
+  target_link_libraries(vek_ebur128 INTERFACE ${VEK_MINGW_DEPS}/lib/libebur128.a)
+else()
+  pkg_check_modules(EBUR128 REQUIRED IMPORTED_TARGET libebur128)
+  add_library(vek_ebur128 INTERFACE)
+  target_link_libraries(vek_ebur128 INTERFACE PkgConfig::EBUR128)
+endif()

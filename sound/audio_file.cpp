@@ -15,7 +15,8 @@ SourceKind SourceKindOfPath(const char* path)
     return ogg ? SourceKind::OggVorbis : SourceKind::Wave;
 }
 
-bool DecodeAudioFile(const char* path, DecodedAudio* out, SourceKind* kind)
+bool DecodeAudioFile(const char* path, DecodedAudio* out, SourceKind* kind,
+                     const DecodeProgress& progress)
 {
     out->Reset();
     if (path == nullptr)
@@ -24,7 +25,7 @@ bool DecodeAudioFile(const char* path, DecodedAudio* out, SourceKind* kind)
     bool decoded;
     if (*kind == SourceKind::OggVorbis)
     {
-        decoded = DecodeOggVorbis(ReadMemoryFile(path), out);
+        decoded = DecodeOggVorbis(ReadMemoryFile(path), out, progress);
     }
     else
     {
@@ -32,7 +33,13 @@ bool DecodeAudioFile(const char* path, DecodedAudio* out, SourceKind* kind)
         decoded = file.Open(path) && ReadWave(file, out);
     }
     if (decoded && IsOpenableFormat(*out->format))
+    {
+        if (progress)
+            progress(*out, out->dataBytes);
         return true;
+    }
+    if (decoded && progress)
+        progress(*out, 0);
     out->Reset();
     return false;
 }

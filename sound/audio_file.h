@@ -14,6 +14,9 @@ SourceKind SourceKindOfPath(const char* path);
 // Needs no sound device and no window: the command-line companion and the
 // tests call it directly. False for a null path, a missing or unreadable
 // file, a file of neither form, and a format that cannot be opened.
-bool DecodeAudioFile(const char* path, DecodedAudio* out, SourceKind* kind);
+// `progress`, when given, follows the decode and is told of the whole data
+// last, when the decode succeeds (see DecodeProgress).
+bool DecodeAudioFile(const char* path, DecodedAudio* out, SourceKind* kind,
+                     const DecodeProgress& progress = {});
 
 } // namespace sound

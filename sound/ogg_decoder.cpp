@@ -119,7 +119,7 @@ void DestroyMemoryFile(MemoryFile* file)
     base::FreeBlock(file);
 }
 
-bool DecodeOggVorbis(MemoryFile* file, DecodedAudio* out)
+bool DecodeOggVorbis(MemoryFile* file, DecodedAudio* out, const DecodeProgress& progress)
 {
     out->Reset();
     if (file == nullptr)
@@ -176,10 +176,14 @@ bool DecodeOggVorbis(MemoryFile* file, DecodedAudio* out)
         if (got < 0 || got > wanted)
         {
             ov_clear(&vorbis);
+            if (progress)
+                progress(*out, 0);
             out->Reset();
             return false;
         }
         written += static_cast<std::uint32_t>(got);
+        if (progress)
+            progress(*out, written);
     }
     ov_clear(&vorbis);
     out->dataBytes = bytes;

@@ -38,8 +38,10 @@ void DestroyMemoryFile(MemoryFile* file);
 // a gap in the pages, is skipped and decoding goes on after it; every other
 // negative result (-1, a bad link, an invalid stream) fails the decode.
 // Decoding stops when the block is full: samples beyond the count that
-// ov_pcm_total announced are not kept.
-bool DecodeOggVorbis(MemoryFile* file, DecodedAudio* out);
+// ov_pcm_total announced are not kept. `progress`, when given, is told of
+// every step of the write position, and of 0 before a failed decode frees
+// the block.
+bool DecodeOggVorbis(MemoryFile* file, DecodedAudio* out, const DecodeProgress& progress = {});
 
 // The same over a copy of a block in memory (fuzz targets, tests).
 bool DecodeOggVorbisFromMemory(const void* data, std::size_t size, DecodedAudio* out);

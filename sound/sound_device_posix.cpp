@@ -90,8 +90,7 @@ namespace device
 DeviceBuffer* CreateStaticBuffer(const WaveFormat& format, std::uint32_t, std::uint8_t*& pcm,
                                  std::uint32_t bytes)
 {
-    if (pcm == nullptr || bytes < kMinBufferBytes || bytes > kMaxBufferBytes ||
-        !IsPlayableFormat(format))
+    if (pcm == nullptr || !FitsStaticBuffer(format, bytes))
         return nullptr;
     auto* store = static_cast<PcmStore*>(base::AllocateZeroed(sizeof(PcmStore)));
     auto* buffer = new (std::nothrow) DeviceBuffer();

@@ -44,13 +44,19 @@ bool IsMixableTag(std::uint16_t tag)
     return tag == kFormatTagPcm || tag == kFormatTagIeeeFloat;
 }
 
+std::uint16_t SubFormatTag(const WaveFormat& format)
+{
+    const std::uint8_t* subFormat = ExtraFormatBytes(format) + kSubFormatOffset;
+    return std::uint16_t(subFormat[0] | subFormat[1] << 8);
+}
+
 bool IsPlayableExtensible(const WaveFormat& format)
 {
     if (format.extraSize < kExtensibleExtraBytes)
         return false;
     const std::uint8_t* extra = ExtraFormatBytes(format);
     const std::uint8_t* subFormat = extra + kSubFormatOffset;
-    const bool mixable = IsMixableTag(std::uint16_t(subFormat[0] | subFormat[1] << 8)) &&
+    const bool mixable = IsMixableTag(SubFormatTag(format)) &&
                          std::memcmp(subFormat + 2, kSubFormatTail, sizeof kSubFormatTail) == 0;
     // More extra bytes than the structure's own are refused, except a count
     // that is the whole structure's size.
@@ -73,6 +79,16 @@ bool IsPlayableFormat(const WaveFormat& format)
     if (!consistent)
         return false;
     return format.formatTag != kFormatTagExtensible || IsPlayableExtensible(format);
+}
+
+bool FitsStaticBuffer(const WaveFormat& format, std::uint32_t bytes)
+{
+    return bytes >= kMinBufferBytes && bytes <= kMaxBufferBytes && IsPlayableFormat(format);
+}
+
+std::uint16_t SampleFormatTag(const WaveFormat& format)
+{
+    return format.formatTag == kFormatTagExtensible ? SubFormatTag(format) : format.formatTag;
 }
 
 float ComputeLength(std::uint32_t dataBytes, const WaveFormat& format)

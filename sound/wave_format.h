@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 
 namespace sound
 {
@@ -56,6 +57,15 @@ bool IsOpenableFormat(const WaveFormat& format);
 // what this refuses, so that both builds turn away the same files.
 bool IsPlayableFormat(const WaveFormat& format);
 
+// Whether a static buffer takes `bytes` bytes of the format: a playable
+// format and a size from kMinBufferBytes to kMaxBufferBytes.
+bool FitsStaticBuffer(const WaveFormat& format, std::uint32_t bytes);
+
+// The tag that says how samples are stored: the format tag, or for
+// WAVE_FORMAT_EXTENSIBLE the tag at the head of its sub-format GUID. Only
+// for a playable format.
+std::uint16_t SampleFormatTag(const WaveFormat& format);
+
 // Seconds of `dataBytes` bytes of the format: bytes / channels / rate /
 // (bits per sample / 8), in double precision, stored as a 32-bit float.
 // Only for an openable format.
@@ -84,5 +94,11 @@ public:
     std::uint8_t* data = nullptr;
     std::uint32_t dataBytes = 0;
 };
+
+// Told while a decoder fills `audio.data`: the first `decodedBytes` bytes
+// are final. Called on the decoding thread, with counts that only grow,
+// except a last count of 0 before a decoder that fails frees the block:
+// from then on the block must not be read.
+using DecodeProgress = std::function<void(const DecodedAudio& audio, std::uint32_t decodedBytes)>;
 
 } // namespace sound

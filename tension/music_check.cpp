@@ -39,7 +39,7 @@ MusicCheckResult CheckMusicRow(const char* musicPath, const char* tensionPath, C
     {
         const CTextString none;
         return finish({Report(MusicCheckResult::MusicUnreadable,
-                              CTextString("BGMファイルが開けません"), message),
+                              CTextString(kMusicUnreadableMessage), message),
                        nullptr, nullptr, &none});
     }
 

@@ -18,6 +18,9 @@ namespace tension
 
 class CTensionFile;
 
+// What the user is shown for music the check cannot open.
+inline constexpr const char* kMusicUnreadableMessage = "BGMファイルが開けません";
+
 enum class MusicCheckResult
 {
     // The tension file fits the music (warnings are not reported).

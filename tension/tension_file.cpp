@@ -17,8 +17,6 @@ namespace
 
 using Byte = unsigned char;
 
-constexpr float kMinimumLength = 60.0f;
-constexpr float kMaximumLength = 480.0f;
 constexpr int kMinimumLengthSeconds = 60;
 constexpr int kMaximumLengthSeconds = 480;
 constexpr std::size_t kNameLimit = 40;
@@ -544,14 +542,14 @@ bool CTensionFile::IsCorrect(sound::CSoundBuffer* sound, CTextString* log)
 bool CTensionFile::CheckLength(float length, CTextString* log)
 {
     // Written so that a length that is not a number fails too.
-    if (!(length >= kMinimumLength))
+    if (!(length >= kShortestMusic))
     {
         RecordFormatted(
             log, "ファイル時間 エラー[%f秒のファイルです : %d秒以上の長さのファイルが必要です]",
             static_cast<double>(length), kMinimumLengthSeconds);
         return false;
     }
-    if (length > kMaximumLength)
+    if (length > kLongestMusic)
     {
         RecordFormatted(
             log, "ファイル時間 エラー[%f秒のファイルです : %d秒以下の長さのファイルが必要です]",

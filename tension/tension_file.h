@@ -41,6 +41,9 @@ struct LevelTally
 };
 
 inline constexpr int kNoTimeLimit = -1;
+// The music a tension file is checked against lasts this many seconds.
+inline constexpr float kShortestMusic = 60.0f;
+inline constexpr float kLongestMusic = 480.0f;
 inline constexpr int kTensionLevelCount = 4;
 
 // One tally per level, indexed by the level's value.

@@ -4,7 +4,6 @@
 #include "cli/command_line.h"
 #include "cli/encoding.h"
 #include "cli/platform.h"
-#include "cli/tension_draft.h"
 #include "cli/vekcfg.h"
 #include "config/save_config.h"
 #include "tests/support/audio_fixtures.h"
@@ -384,24 +383,6 @@ TEST_F(Commands, EveryDraftPassesTheCheckAndMusicItCannotUseGetsItsMessage)
             EXPECT_EQ(Vekcfg({"check", music, draft}).out, kAccepted) << seconds;
         }
     }
-}
-
-// The draft's file-name entry: the music's name within forty bytes, never
-// cut inside a character ("あ" is 82 A0), never ending the entry early.
-TEST(DraftName, IsTheFileNameWithinFortyBytesAndNeverEndsTheEntryEarly)
-{
-    std::string a20;
-    for (int i = 0; i < 20; ++i)
-        a20 += "\x82\xA0";
-    const std::pair<std::string, std::string> rows[] = {
-        {"C:\\music\\battle.ogg", "battle"},
-        {"/home/u/a;b.tar.wav", "a_b.tar"},
-        {"folder/" + a20 + "\x82\xA0.wav", a20},
-        {"a" + a20 + ".ogg", "a" + a20.substr(2)},
-        {"  .wav", "BGM"},
-    };
-    for (const auto& [path, name] : rows)
-        EXPECT_EQ(cli::DraftName(path), name) << path;
 }
 
 // The tool's own file, found from TEMP as the tool finds it, where the

@@ -43,6 +43,12 @@ Bytes MakeWave(const WaveSpec& fixture);
 // A wave of `seconds` of 8-bit mono at 1000 Hz, for music of a given length.
 Bytes MakeWaveOfLength(double seconds);
 
+// A tone in every channel whose level at each time is `dbfs(seconds)` (dB
+// below full scale), in the spec's PCM or float (tag 3) format; the wave
+// holds whole frames of `seconds`.
+using LevelAt = std::function<double(double seconds)>;
+Bytes MakeToneWave(const WaveSpec& format, double seconds, const LevelAt& dbfs);
+
 struct OggFixture
 {
     int channels = 2;
