@@ -1,7 +1,9 @@
 #include "cli/check_report.h"
 
 #include "cli/encoding.h"
+#include "sound/loudness.h"
 #include "sound/sound_buffer.h"
+#include "tension/loudness_timeline.h"
 
 #include <cstdio>
 
@@ -46,6 +48,17 @@ std::string Padded(std::string text, std::size_t width)
     return text;
 }
 
+// Measured from the decoded music the check itself holds.
+std::vector<double> LoudnessOf(const sound::CSoundBuffer& music)
+{
+    const sound::BufferInfo& info = music.GetInfo();
+    std::vector<std::uint8_t> pcm(info.dataBytes);
+    if (info.format == nullptr ||
+        !sound::device::ReadBack(music.GetMasterBuffer(), pcm.data(), info.dataBytes))
+        return {};
+    return sound::MeasureLoudness(*info.format, pcm.data(), pcm.size());
+}
+
 } // namespace
 
 CheckFigures ReadFigures(const tension::MusicCheckInspection& inspection,
@@ -75,14 +88,23 @@ CheckFigures ReadFigures(const tension::MusicCheckInspection& inspection,
     return figures;
 }
 
-CheckRun RunCheck(const std::string& musicPath, const std::string& tensionPath)
+CheckRun RunCheck(const std::string& musicPath, const std::string& tensionPath,
+                  bool measureLoudness)
 {
     CheckRun run{};
     tension::CTextString message;
-    run.result =
-        tension::CheckMusicRow(musicPath.c_str(), tensionPath.c_str(), &message,
-                               [&run, &tensionPath](const tension::MusicCheckInspection& seen)
-                               { run.figures = ReadFigures(seen, tensionPath); });
+    const auto inspect = [&](const tension::MusicCheckInspection& seen)
+    {
+        run.figures = ReadFigures(seen, tensionPath);
+        if (!measureLoudness || seen.music == nullptr)
+            return;
+        CheckFigures& figures = run.figures;
+        figures.loudness = LoudnessOf(*seen.music);
+        if (figures.hasTimeline)
+            figures.hasFigure = tension::FollowFigure(*seen.tensionFile->GetTimeline(),
+                                                      figures.loudness, &figures.figure);
+    };
+    run.result = tension::CheckMusicRow(musicPath.c_str(), tensionPath.c_str(), &message, inspect);
     run.message = Utf8FromCp932(message.CStr());
     if (!run.message.empty() && run.message.back() != '\n')
         run.message += '\n';
@@ -137,6 +159,15 @@ std::string DetailsText(tension::MusicCheckResult result, const CheckFigures& fi
                std::to_string(tally.segments) + " of " + std::to_string(tally.segmentLimit) +
                " segments\n";
     }
+
+    out += "follows the loudness: ";
+    if (figures.hasFigure)
+        out += Format("%.2f", figures.figure) +
+               " (rank correlation of each second's level with its short-term loudness)\n";
+    else
+        out += figures.loudness.empty()
+                   ? "no figure (the loudness of music of this format is not measured)\n"
+                   : "no figure (the level or the loudness never changes)\n";
 
     const std::string window = Seconds(figures.finaleWindow);
     if (figures.finaleTime == 0.0f)

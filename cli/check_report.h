@@ -40,6 +40,11 @@ struct CheckFigures
     float finaleTime = 0.0f;
     float finaleWindow = 0.0f;
     tension::TensionLevel levelAtFinale = tension::TensionLevel::Normal;
+    // When asked for: the music's loudness, one value a second (empty when
+    // its format is not measured), and how well the timeline follows it.
+    std::vector<double> loudness;
+    bool hasFigure = false;
+    double figure = 0.0;
 };
 
 struct CheckRun
@@ -50,8 +55,11 @@ struct CheckRun
     CheckFigures figures;
 };
 
-// The check of MUSIC against TENSION, both handed on as given.
-CheckRun RunCheck(const std::string& musicPath, const std::string& tensionPath);
+// The check of MUSIC against TENSION, both handed on as given; with
+// `measureLoudness`, the loudness of the music the check decoded and the
+// timeline's figure against it too.
+CheckRun RunCheck(const std::string& musicPath, const std::string& tensionPath,
+                  bool measureLoudness = false);
 
 // The figures of a check, read through the inspection of its objects.
 CheckFigures ReadFigures(const tension::MusicCheckInspection& inspection,

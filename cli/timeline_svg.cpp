@@ -14,6 +14,11 @@ constexpr double kRight = 40.0;
 constexpr double kBarTop = 64.0;
 constexpr double kBarHeight = 56.0;
 constexpr double kLegendTop = 176.0;
+constexpr double kCurveTop = 184.0;
+constexpr double kCurveHeight = 96.0;
+// Room the loudness curve takes above the legend.
+constexpr double kCurveRoom = 136.0;
+constexpr double kCurveSpan = 30.0;
 constexpr double kLineHeight = 22.0;
 constexpr int kMessageLines = 6;
 
@@ -88,6 +93,46 @@ std::vector<std::string> LogLines(const std::string& log)
     return lines;
 }
 
+// The loudness of each second under the timeline, scaled from its quietest
+// to its loudest value, with the finale's window across it.
+template <typename Place> std::string LoudnessCurve(const CheckFigures& figures, const Place& x)
+{
+    const auto [low, high] = std::minmax_element(figures.loudness.begin(), figures.loudness.end());
+    // A fade to silence would flatten the rest: the scale spans at most
+    // kCurveSpan below the loudest value, and quieter seconds lie on its floor.
+    const double floor = std::max(*low, *high - kCurveSpan);
+    const double range = *high > floor ? *high - floor : 1.0;
+    const auto y = [&](double value)
+    { return kCurveTop + kCurveHeight * (*high - std::max(value, floor)) / range; };
+    std::string svg = "<g id=\"loudness\">\n";
+    svg +=
+        Text(kLeft, kCurveTop - 8,
+             "short-term loudness, " + Number(*low) + " to " + Number(*high) + " LUFS; " +
+                 (figures.hasFigure ? "rank correlation with the levels " + Number(figures.figure)
+                                    : std::string("no rank correlation")),
+             " font-size=\"12\"");
+    svg += "<rect x=\"" + Number(kLeft) + "\" y=\"" + Number(kCurveTop) + "\" width=\"" +
+           Number(x(1.0e9) - kLeft) + "\" height=\"" + Number(kCurveHeight) +
+           "\" fill=\"#f4f4f4\"/>\n";
+    if (figures.finaleTime != 0.0f)
+    {
+        const double start = x(figures.finaleTime);
+        const double end = x(double(figures.finaleTime) + double(figures.finaleWindow));
+        svg += "<rect class=\"finale-window\" x=\"" + Number(start) + "\" y=\"" +
+               Number(kCurveTop) + "\" width=\"" + Number(std::max(end - start, 1.0)) +
+               "\" height=\"" + Number(kCurveHeight) +
+               "\" fill=\"#ffe066\" fill-opacity=\"0.55\" stroke=\"#000000\" "
+               "stroke-dasharray=\"4 3\"/>\n";
+    }
+    svg += "<polyline class=\"loudness\" fill=\"none\" stroke=\"#202124\" "
+           "stroke-width=\"1.5\" points=\"";
+    for (std::size_t second = 0; second < figures.loudness.size(); ++second)
+        svg += (second == 0 ? "" : " ") + Number(x(double(second) + 0.5)) + "," +
+               Number(y(figures.loudness[second]));
+    svg += "\"/>\n</g>\n";
+    return svg;
+}
+
 } // namespace
 
 std::string TimelineSvg(tension::MusicCheckResult result, const CheckFigures& figures)
@@ -101,7 +146,9 @@ std::string TimelineSvg(tension::MusicCheckResult result, const CheckFigures& fi
     const std::vector<std::string> messages =
         accepted ? std::vector<std::string>() : LogLines(figures.log);
     const int shownMessages = std::min<int>(static_cast<int>(messages.size()), kMessageLines);
-    const double messagesTop = kLegendTop + kLineHeight * (tension::kTensionLevelCount + 0.5);
+    const bool curve = !figures.loudness.empty();
+    const double legendTop = kLegendTop + (curve ? kCurveRoom : 0.0);
+    const double messagesTop = legendTop + kLineHeight * (tension::kTensionLevelCount + 0.5);
     const double height = messagesTop + kLineHeight * (shownMessages + 1);
 
     std::string svg = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n";
@@ -169,11 +216,14 @@ std::string TimelineSvg(tension::MusicCheckResult result, const CheckFigures& fi
     svg += Text(x(length), axisY + 18, Seconds(length) + " s", " text-anchor=\"end\"");
     svg += "</g>\n";
 
+    if (curve)
+        svg += LoudnessCurve(figures, x);
+
     svg += "<g id=\"legend\">\n";
     for (int level = 0; level < tension::kTensionLevelCount; ++level)
     {
         const tension::LevelTally& tally = figures.tally.levels[level];
-        const double top = kLegendTop + kLineHeight * level;
+        const double top = legendTop + kLineHeight * level;
         std::string limit = tally.timeLimit == tension::kNoTimeLimit
                                 ? std::string(" (no time limit)")
                                 : " of at most " + std::to_string(tally.timeLimit) + " s";

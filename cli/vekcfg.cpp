@@ -74,7 +74,8 @@ int Check(const Invocation& invocation)
     sound::CSound device;
     if (!StartSoundDeviceOrComplain(device))
         return kExitTrouble;
-    const CheckRun run = RunCheck(invocation.musicPath, invocation.tensionPath);
+    const CheckRun run = RunCheck(invocation.musicPath, invocation.tensionPath,
+                                  invocation.details || !invocation.svgPath.empty());
     std::string out = run.message;
     if (invocation.details)
         out += DetailsText(run.result, run.figures);

@@ -118,13 +118,27 @@ TEST_F(Commands, DetailsAndThePictureShowTheTimeline)
           "  HiTension       30.000 s of 36 s      1 of 4 segments\n",
           "finale: 170.000 s, window 3.600 s (to 173.600 s), ClimaxTension there\n"})
         EXPECT_NE(details.out.find(line), std::string::npos) << line;
+    EXPECT_NE(details.out.find("follows the loudness: no figure (the loudness of music of this "
+                               "format is not measured)\n"),
+              std::string::npos);
+    // Music that is loud only where the example's climax stands.
+    const std::string loud = folder.File("loud.wav");
+    testing_support::WriteBytes(
+        loud, testing_support::MakeToneWave({1, 1, 8000, 16, {}, 0}, 180.0,
+                                            [](double t) { return t >= 165.0 ? -10.0 : -30.0; }));
+    const ProgramRun measured = Vekcfg({"check", "--details", loud, example});
+    EXPECT_NE(measured.out.find("follows the loudness: 0.48 (rank correlation of each second's "
+                                "level with its short-term loudness)\n"),
+              std::string::npos)
+        << measured.out;
 
     const std::string svg = folder.File("t.svg");
-    EXPECT_EQ(Vekcfg({"check", "--svg", svg, music, climax}).exitCode, 1);
+    EXPECT_EQ(Vekcfg({"check", "--svg", svg, loud, climax}).exitCode, 1);
     const std::vector<std::uint8_t> bytes = ReadBytes(svg);
     const std::string picture(bytes.begin(), bytes.end());
-    for (const char8_t* part : {u8"<svg ", u8"class=\"finale-window\"", u8"変換エラー!!",
-                                u8"data-level=\"ClimaxTension\" data-from=\"150.000\""})
+    for (const char8_t* part :
+         {u8"<svg ", u8"class=\"finale-window\"", u8"変換エラー!!",
+          u8"<polyline class=\"loudness\"", u8"data-level=\"ClimaxTension\" data-from=\"150.000\""})
         EXPECT_NE(picture.find(Utf8(part)), std::string::npos) << Utf8(part);
     const ProgramRun unwritable =
         Vekcfg({"check", "--svg", folder.File("no/t.svg"), music, example});
