@@ -18,7 +18,10 @@ std::string TemporaryPathFor(const std::string& path)
     return path.substr(0, dot + 1) + extension;
 }
 
-bool WriteFileAtomically(const char* path, const void* data, std::size_t size)
+namespace
+{
+
+bool WriteThenMove(const char* path, const void* data, std::size_t size, bool replacing)
 {
     const std::string temporary = TemporaryPathFor(path);
     std::FILE* file = std::fopen(temporary.c_str(), "wb");
@@ -27,10 +30,23 @@ bool WriteFileAtomically(const char* path, const void* data, std::size_t size)
     bool written = std::fwrite(data, 1, size, file) == size;
     written = FlushToDisk(file) && written;
     written = std::fclose(file) == 0 && written;
-    if (written && ReplaceExistingFile(temporary.c_str(), path))
+    if (written && (replacing ? ReplaceExistingFile(temporary.c_str(), path)
+                              : MoveToNewName(temporary.c_str(), path)))
         return true;
     std::remove(temporary.c_str());
     return false;
+}
+
+} // namespace
+
+bool WriteFileAtomically(const char* path, const void* data, std::size_t size)
+{
+    return WriteThenMove(path, data, size, true);
+}
+
+bool WriteNewFileAtomically(const char* path, const void* data, std::size_t size)
+{
+    return WriteThenMove(path, data, size, false);
 }
 
 } // namespace base

@@ -19,4 +19,8 @@ bool FlushToDisk(std::FILE* file);
 // Puts `source` in the place of `target` in one step, replacing it.
 bool ReplaceExistingFile(const char* source, const char* target);
 
+// Puts `source` in the place of `target` in one step, only when nothing
+// stands there.
+bool MoveToNewName(const char* source, const char* target);
+
 } // namespace base

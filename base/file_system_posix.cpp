@@ -27,4 +27,13 @@ bool ReplaceExistingFile(const char* source, const char* target)
     return std::rename(source, target) == 0;
 }
 
+bool MoveToNewName(const char* source, const char* target)
+{
+    // A link fails where a file stands; rename would replace it.
+    if (::link(source, target) != 0)
+        return false;
+    ::unlink(source);
+    return true;
+}
+
 } // namespace base

@@ -26,4 +26,9 @@ bool ReplaceExistingFile(const char* source, const char* target)
     return ::MoveFileExA(source, target, MOVEFILE_REPLACE_EXISTING | MOVEFILE_WRITE_THROUGH) != 0;
 }
 
+bool MoveToNewName(const char* source, const char* target)
+{
+    return ::MoveFileExA(source, target, MOVEFILE_WRITE_THROUGH) != 0;
+}
+
 } // namespace base

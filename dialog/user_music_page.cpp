@@ -4,11 +4,15 @@
 // way the game will load it.
 #include "app/config_application.h"
 #include "app/system.h"
+#include "base/atomic_file.h"
 #include "base/window_text_win32.h"
 #include "config/fixed_text.h"
 #include "dialog/user_music_values.h"
 #include "resources/resource.h"
+#include "sound/loudness.h"
+#include "sound/sound_buffer.h"
 #include "tension/music_check.h"
+#include "tension/tension_draft.h"
 
 #include <optional>
 #include <shellapi.h>
@@ -31,6 +35,11 @@ void RefusePath()
 {
     base::ShowMessage(nullptr, kPathNotInCodePage, "", MB_OK);
 }
+
+// The offer of a draft when a row's tension file is missing.
+constexpr char kDraftQuestion[] =
+    "テンションファイルがありません。\nBGMの音の大きさからテンションファイルを作成しますか?";
+constexpr char kDraftFailed[] = "テンションファイルを作成できませんでした";
 
 // Sends the edit's messages through `procedure` from now on and shows the
 // path; the edit takes files dropped from the shell.
@@ -124,15 +133,48 @@ void BrowseRow(CSystem& system, config::UserBgmRow& paths, HWND musicEdit, HWND 
     base::SetPathText(tensionEdit, tensionFile);
 }
 
-// Shows the outcome in a plain box; the record is only read.
-bool CheckRow(const config::UserBgmRow& paths)
+// A draft laid on the music, written where nothing stands.
+bool WriteDraft(const std::string& musicPath, const std::string& path)
 {
+    sound::MusicMeasure music;
+    if (!sound::MeasureMusic(musicPath.c_str(), &music))
+        return false;
+    const std::string text =
+        tension::DraftTension(tension::DraftName(musicPath), music.length, music.loudness);
+    return base::WriteNewFileAtomically(path.c_str(), text.data(), text.size());
+}
+
+// Shows the outcome in a plain box. When the tension file is missing, a
+// draft from the music is offered; the path of a draft written goes into
+// the field as if typed, and the row is checked again.
+bool CheckRow(config::UserBgmRow& paths, HWND tensionEdit)
+{
+    const std::string musicPath = config::FieldText(paths.musicPath);
+    const std::string tensionPath = config::FieldText(paths.tensionPath);
+    float length = 0.0f;
     tension::CTextString message;
     const tension::MusicCheckResult result =
-        tension::CheckMusicRow(config::FieldText(paths.musicPath).c_str(),
-                               config::FieldText(paths.tensionPath).c_str(), &message);
+        tension::CheckMusicRow(musicPath.c_str(), tensionPath.c_str(), &message,
+                               [&length](const tension::MusicCheckInspection& seen) {
+                                   length = seen.music != nullptr ? seen.music->GetLength() : 0.0f;
+                               });
     base::ShowMessage(nullptr, message.CStr(), "", MB_OK);
-    return result == tension::MusicCheckResult::Accepted;
+    if (result == tension::MusicCheckResult::Accepted)
+        return true;
+    const std::string draft = tension::DraftPathFor(
+        musicPath, tensionPath, result != tension::MusicCheckResult::MusicUnreadable, length,
+        config::kPathTextLimit);
+    if (draft.empty() ||
+        base::ShowMessage(nullptr, kDraftQuestion, "", MB_YESNO | MB_ICONQUESTION) != IDYES)
+        return false;
+    if (!WriteDraft(musicPath, draft))
+    {
+        base::ShowMessage(nullptr, kDraftFailed, "", MB_OK);
+        return false;
+    }
+    config::StoreFieldText(paths.tensionPath, config::kPathTextLimit, draft);
+    base::SetPathText(tensionEdit, draft);
+    return CheckRow(paths, tensionEdit);
 }
 
 } // namespace
@@ -201,7 +243,7 @@ LRESULT CConfigApplication::OnUserMusicPage(HWND page, UINT message, WPARAM wPar
     case dialog::MusicColumn::Check:
         if (code != BN_CLICKED)
             return TRUE;
-        return CheckRow(paths) ? TRUE : FALSE;
+        return CheckRow(paths, tensionEdits_[row].window) ? TRUE : FALSE;
     }
     return TRUE;
 }

@@ -4,6 +4,8 @@
 #include "tension/loudness_timeline.h"
 #include "tension/tension_file.h"
 
+#include <algorithm>
+#include <cerrno>
 #include <cstdint>
 #include <cstdio>
 #include <vector>
@@ -21,6 +23,16 @@ constexpr const char* kLevelKeys[kTensionLevelCount] = {"LOW", "NORMAL", "HI", "
 bool IsTrailByte(std::uint8_t byte)
 {
     return byte >= 0x40 && byte <= 0xFC && byte != 0x7F;
+}
+
+bool IsMissing(const std::string& path)
+{
+    errno = 0;
+    std::FILE* file = std::fopen(path.c_str(), "rb");
+    if (file == nullptr)
+        return errno == ENOENT;
+    std::fclose(file);
+    return false;
 }
 
 std::string Figure(double value, const char* format = "%.1f")
@@ -107,6 +119,28 @@ std::string DraftTension(const std::string& name, float length, const std::vecto
             Figure(weighed.GetFinaleWindow()) +
             " s from its time, inside the climax, from its loudest second.\n";
     return text + entries;
+}
+
+std::string DraftPathFor(const std::string& musicPath, const std::string& tensionPath,
+                         bool musicOpened, float musicLength, std::size_t pathLimit)
+{
+    if (!musicOpened || !(musicLength >= kShortestMusic && musicLength <= kLongestMusic))
+        return "";
+    std::string path = tensionPath;
+    if (path.empty())
+    {
+        // A trail byte may be a backslash: the folder ends at the last
+        // character that is one.
+        const char* slash = base::FindLastCharacter(musicPath.c_str(), '\\');
+        const std::size_t folderEnd =
+            std::max(slash == nullptr ? 0 : std::size_t(slash - musicPath.c_str()) + 1,
+                     musicPath.rfind('/') == std::string::npos ? 0 : musicPath.rfind('/') + 1);
+        const std::size_t dot = musicPath.rfind('.');
+        path =
+            (dot == std::string::npos || dot < folderEnd ? musicPath : musicPath.substr(0, dot)) +
+            ".txt";
+    }
+    return path.size() <= pathLimit && IsMissing(path) ? path : "";
 }
 
 } // namespace tension

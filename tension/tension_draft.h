@@ -26,4 +26,13 @@ std::string DraftName(std::string_view musicFileName);
 std::string DraftTension(const std::string& name, float length,
                          const std::vector<double>& loudness);
 
+// Where the BGM page writes a draft after the check of a row, or empty when
+// it offers none. It offers one only for music that opened and lasts 60 to
+// 480 seconds, whose tension file is missing: `tensionPath` empty or naming
+// no file. The draft goes to `tensionPath`, or when that is empty beside the
+// music, its extension replaced by ".txt"; never where something stands, nor
+// to a path longer than `pathLimit` bytes.
+std::string DraftPathFor(const std::string& musicPath, const std::string& tensionPath,
+                         bool musicOpened, float musicLength, std::size_t pathLimit);
+
 } // namespace tension

@@ -40,4 +40,11 @@ TEST(AtomicFile, ReplacesTheFileOrLeavesWhatStandsThereAndNoTemporary)
 #endif
     EXPECT_EQ(ReadBytes(file), data);
     EXPECT_FALSE(fs::exists(base::TemporaryPathFor(file)));
+    // A new file is written only where nothing stands.
+    const std::string fresh = folder.File("fresh.bin");
+    EXPECT_FALSE(base::WriteNewFileAtomically(file.c_str(), image.data(), image.size()));
+    EXPECT_TRUE(base::WriteNewFileAtomically(fresh.c_str(), data.data(), data.size()));
+    EXPECT_EQ(ReadBytes(file), data);
+    EXPECT_EQ(ReadBytes(fresh), data);
+    EXPECT_FALSE(fs::exists(base::TemporaryPathFor(file)));
 }

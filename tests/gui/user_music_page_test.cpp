@@ -78,11 +78,15 @@ TEST(UserMusicPage, ADropTheCheckAndBrowsingEachServeTheirRow)
     }
     EXPECT_EQ(config::FieldText(row.musicPath), music);
     // The refusal, then the check: the row's music was read; it has no
-    // tension file.
-    ASSERT_EQ(gui::messageBoxes.size(), 2u);
+    // tension file, and a draft is offered (and declined).
+    ASSERT_EQ(gui::messageBoxes.size(), 3u);
     EXPECT_EQ(gui::messageBoxes[0].second.substr(0, 12), "このパスには");
     EXPECT_EQ(gui::messageBoxes[1],
               (std::pair<std::string, std::string>{"", "ファイルが開けません!!\n"}));
+    EXPECT_EQ(
+        gui::messageBoxes[2].second,
+        "テンションファイルがありません。\nBGMの音の大きさからテンションファイルを作成しますか?");
+    EXPECT_EQ(config::FieldText(row.tensionPath), "");
 
     const std::filesystem::path programFolder = std::filesystem::current_path();
     std::filesystem::current_path(folder.Path());

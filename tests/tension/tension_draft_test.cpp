@@ -3,6 +3,7 @@
 #include "tension/loudness_timeline.h"
 #include "tension/tension_draft.h"
 #include "tension/tension_file.h"
+#include "tests/support/temp_folder.h"
 
 #include <cmath>
 #include <cstdlib>
@@ -132,6 +133,40 @@ TEST(DraftName, IsTheFileNameWithinFortyBytesOnOneLineThatNeverEndsTheEntryEarly
     };
     for (const auto& [path, name] : rows)
         EXPECT_EQ(tension::DraftName(path), name) << path;
+}
+
+// The BGM page offers a draft for a missing tension file only, and writes
+// it where the field says or beside the music, never over anything.
+TEST(DraftPathFor, IsTheMissingTensionFileOrTheMusicsTextFileNeverOneThatStands)
+{
+    const testing_support::TempFolder folder;
+    const std::string music = folder.File("m.wav"), stands = folder.File("stands.txt");
+    testing_support::WriteBytes(stands, {1});
+    testing_support::WriteBytes(folder.File("kept.txt"), {1});
+    const std::string so = "\x83\x5C";
+    const struct
+    {
+        std::string music, tension;
+        bool opened;
+        float length;
+        std::size_t limit;
+        std::string path;
+    } rows[] = {
+        {music, "", true, 120.0f, 259, folder.File("m.txt")},
+        {music, folder.File("x.txt"), true, 120.0f, 259, folder.File("x.txt")},
+        {music, stands, true, 120.0f, 259, ""},
+        {folder.File("kept.ogg"), "", true, 120.0f, 259, ""},
+        {folder.File("no-extension"), "", true, 60.0f, 259, folder.File("no-extension.txt")},
+        {folder.File("a\\b.c") + so, "", true, 480.0f, 259, folder.File("a\\b.txt")},
+        {music, "", false, 120.0f, 259, ""},
+        {music, "", true, 59.9f, 259, ""},
+        {music, "", true, 480.5f, 259, ""},
+        {music, "", true, 120.0f, folder.File("m.txt").size() - 1, ""},
+    };
+    for (const auto& row : rows)
+        EXPECT_EQ(tension::DraftPathFor(row.music, row.tension, row.opened, row.length, row.limit),
+                  row.path)
+            << row.music << " " << row.tension;
 }
 
 } // namespace
