@@ -127,8 +127,13 @@ template <typename Place> std::string LoudnessCurve(const CheckFigures& figures,
     svg += "<polyline class=\"loudness\" fill=\"none\" stroke=\"#202124\" "
            "stroke-width=\"1.5\" points=\"";
     for (std::size_t second = 0; second < figures.loudness.size(); ++second)
-        svg += (second == 0 ? "" : " ") + Number(x(double(second) + 0.5)) + "," +
-               Number(y(figures.loudness[second]));
+    {
+        if (second != 0)
+            svg += ' ';
+        svg += Number(x(double(second) + 0.5));
+        svg += ',';
+        svg += Number(y(figures.loudness[second]));
+    }
     svg += "\"/>\n</g>\n";
     return svg;
 }
