@@ -37,8 +37,7 @@ void RefusePath()
 }
 
 // The offer of a draft when a row's tension file is missing.
-constexpr char kDraftQuestion[] =
-    "テンションファイルがありません。\nBGMの音の大きさからテンションファイルを作成しますか?";
+constexpr char kDraftQuestion[] = "テンションファイルをBGMから作成しますか?";
 constexpr char kDraftFailed[] = "テンションファイルを作成できませんでした";
 
 // Sends the edit's messages through `procedure` from now on and shows the

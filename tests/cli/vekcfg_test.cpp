@@ -118,19 +118,16 @@ TEST_F(Commands, DetailsAndThePictureShowTheTimeline)
           "  HiTension       30.000 s of 36 s      1 of 4 segments\n",
           "finale: 170.000 s, window 3.600 s (to 173.600 s), ClimaxTension there\n"})
         EXPECT_NE(details.out.find(line), std::string::npos) << line;
-    EXPECT_NE(details.out.find("follows the loudness: no figure (the loudness of music of this "
-                               "format is not measured)\n"),
+    EXPECT_NE(details.out.find("follows the loudness: no figure (the loudness of music"),
               std::string::npos);
     // Music that is loud only where the example's climax stands.
     const std::string loud = folder.File("loud.wav");
     testing_support::WriteBytes(
         loud, testing_support::MakeToneWave({1, 1, 8000, 16, {}, 0}, 180.0,
                                             [](double t) { return t >= 165.0 ? -10.0 : -30.0; }));
-    const ProgramRun measured = Vekcfg({"check", "--details", loud, example});
-    EXPECT_NE(measured.out.find("follows the loudness: 0.48 (rank correlation of each second's "
-                                "level with its short-term loudness)\n"),
-              std::string::npos)
-        << measured.out;
+    EXPECT_NE(
+        Vekcfg({"check", "--details", loud, example}).out.find("follows the loudness: 0.48 (rank"),
+        std::string::npos);
 
     const std::string svg = folder.File("t.svg");
     EXPECT_EQ(Vekcfg({"check", "--svg", svg, loud, climax}).exitCode, 1);
@@ -370,16 +367,14 @@ TEST_F(Commands, EveryKindOfRefusalExitsTwoNamingTheSettingAndLeavesTheFile)
     }
 }
 
-// Across the accepted range of music lengths, and the music it cannot use.
+// A draft the check accepts (every length and kind of music: the tension
+// tests), and the music it cannot use.
 TEST_F(Commands, EveryDraftPassesTheCheckAndMusicItCannotUseGetsItsMessage)
 {
     const std::string draft = folder.File("draft.txt");
     const std::pair<double, std::string> rows[] = {
         {59.999, Utf8(u8"60秒以上の長さのファイルが必要です]\n")},
-        {60.0, ""},
-        {99.9, ""},
         {183.37, ""},
-        {480.0, ""},
         {480.001, Utf8(u8"480秒以下の長さのファイルが必要です]\n")},
     };
     for (const auto& [seconds, refusal] : rows)

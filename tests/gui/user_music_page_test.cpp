@@ -83,9 +83,7 @@ TEST(UserMusicPage, ADropTheCheckAndBrowsingEachServeTheirRow)
     EXPECT_EQ(gui::messageBoxes[0].second.substr(0, 12), "このパスには");
     EXPECT_EQ(gui::messageBoxes[1],
               (std::pair<std::string, std::string>{"", "ファイルが開けません!!\n"}));
-    EXPECT_EQ(
-        gui::messageBoxes[2].second,
-        "テンションファイルがありません。\nBGMの音の大きさからテンションファイルを作成しますか?");
+    EXPECT_EQ(gui::messageBoxes[2].second, "テンションファイルをBGMから作成しますか?");
     EXPECT_EQ(config::FieldText(row.tensionPath), "");
 
     const std::filesystem::path programFolder = std::filesystem::current_path();

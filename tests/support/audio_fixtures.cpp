@@ -100,32 +100,18 @@ Bytes MakeWaveOfLength(double seconds)
 Bytes MakeToneWave(const WaveSpec& format, double seconds, const LevelAt& dbfs)
 {
     const int bytes = format.bitsPerSample / 8;
-    const auto frames = static_cast<std::size_t>(seconds * format.sampleRate);
     Bytes data;
-    for (std::size_t frame = 0; frame < frames; ++frame)
+    for (std::size_t frame = 0; frame < std::size_t(seconds * format.sampleRate); ++frame)
     {
-        const double time = static_cast<double>(frame) / format.sampleRate;
-        const double sample =
-            std::pow(10.0, dbfs(time) / 20.0) * std::sin(2.0 * 3.14159265358979 * 997.0 * time);
-        for (int channel = 0; channel < format.channels; ++channel)
-        {
-            std::uint64_t word;
-            if (format.formatTag == 3 && bytes == 4)
-            {
-                const float value = static_cast<float>(sample);
-                std::uint32_t bits;
-                std::memcpy(&bits, &value, 4);
-                word = bits;
-            }
-            else if (format.formatTag == 3)
-                std::memcpy(&word, &sample, 8);
-            else
-                word = static_cast<std::uint64_t>(
-                    std::llround(sample * (std::ldexp(1.0, 8 * bytes - 1) - 1)) +
-                    (bytes == 1 ? 128 : 0));
-            for (int i = 0; i < bytes; ++i)
-                data.push_back(std::uint8_t(word >> 8 * i));
-        }
+        const double time = double(frame) / format.sampleRate;
+        const double sample = std::pow(10.0, dbfs(time) / 20.0) * std::sin(6264.0 * time);
+        const float single = float(sample);
+        std::uint64_t word = std::uint64_t(
+            std::llround(sample * (std::ldexp(1.0, 8 * bytes - 1) - 1)) + (bytes == 1 ? 128 : 0));
+        if (format.formatTag == 3)
+            bytes == 4 ? std::memcpy(&word, &single, 4) : std::memcpy(&word, &sample, 8);
+        for (int i = 0; i < bytes * format.channels; ++i)
+            data.push_back(std::uint8_t(word >> 8 * (i % bytes)));
     }
     WaveSpec sized = format;
     sized.dataBytes = static_cast<std::uint32_t>(data.size());

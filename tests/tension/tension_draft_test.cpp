@@ -5,42 +5,33 @@
 #include "tension/tension_file.h"
 #include "tests/support/temp_folder.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstdlib>
 #include <functional>
 #include <gtest/gtest.h>
+#include <tuple>
 
 namespace
 {
 
 TEST(RankCorrelation, RanksTiesByTheirMeanAndHasNoValueWithoutChange)
 {
-    const struct
-    {
-        std::vector<double> a, b;
-        bool has;
-        double figure;
-    } rows[] = {
+    const std::tuple<std::vector<double>, std::vector<double>, bool, double> rows[] = {
         {{1, 2, 3, 4}, {10, 20, 30, 40}, true, 1.0},
         {{1, 2, 3, 4}, {4, 3, 2, 1}, true, -1.0},
         // Ranks 1.5 1.5 3 4 against 1 2 3 4.
         {{0, 0, 1, 2}, {1, 2, 3, 4}, true, 4.5 / std::sqrt(4.5 * 5.0)},
         {{1, 1, 1}, {1, 2, 3}, false, 0.0},
-        {{1}, {1}, false, 0.0},
         {{1, 2}, {1, 2, 3}, false, 0.0},
     };
-    for (const auto& row : rows)
+    for (const auto& [a, b, has, expected] : rows)
     {
         double figure = 0.0;
-        ASSERT_EQ(tension::RankCorrelation(row.a, row.b, &figure), row.has) << row.figure;
-        if (row.has)
-        {
-            EXPECT_DOUBLE_EQ(figure, row.figure);
-        }
+        ASSERT_EQ(tension::RankCorrelation(a, b, &figure), has) << expected;
+        EXPECT_DOUBLE_EQ(has ? figure : 0.0, expected);
     }
 }
-
-using Shape = std::function<double(double share)>;
 
 double Bump(double share, double at, double width)
 {
@@ -52,11 +43,7 @@ double Bump(double share, double at, double width)
 // music's loudest second there, and it follows music that changes.
 TEST(TensionDraft, EveryLengthAndShapeGivesADraftTheCheckAcceptsThatFollowsTheMusic)
 {
-    const struct
-    {
-        const char* name;
-        Shape loudness;
-    } shapes[] = {
+    const std::pair<std::string, std::function<double(double share)>> shapes[] = {
         {"flat", [](double) { return -20.0; }},
         {"one peak", [](double s) { return -40.0 + 25.0 * Bump(s, 0.6, 0.1); }},
         {"two peaks",
@@ -68,12 +55,12 @@ TEST(TensionDraft, EveryLengthAndShapeGivesADraftTheCheckAcceptsThatFollowsTheMu
     };
     for (const float length : {60.0f, 99.9f, 300.5f, 480.0f})
     {
-        for (const auto& shape : shapes)
+        for (const auto& [name, shape] : shapes)
         {
-            const std::string label = std::string(shape.name) + " " + std::to_string(length);
+            const std::string label = name + " " + std::to_string(length);
             std::vector<double> loudness;
             for (int second = 0; second < int(length); ++second)
-                loudness.push_back(std::round(shape.loudness(second / length) * 100.0) / 100.0);
+                loudness.push_back(std::round(shape(second / length) * 100.0) / 100.0);
             const std::string text = tension::DraftTension("x", length, loudness);
             tension::CTensionFile draft;
             tension::CTextString log;
@@ -82,35 +69,24 @@ TEST(TensionDraft, EveryLengthAndShapeGivesADraftTheCheckAcceptsThatFollowsTheMu
                 << log.CStr() << text;
             EXPECT_STREQ(log.CStr(), "") << label;
             const float finale = draft.GetFinaleTime();
+            if (name == "one peak")
+            {
+                EXPECT_EQ(loudness[std::size_t(finale)],
+                          *std::max_element(loudness.begin(), loudness.end()))
+                    << label;
+            }
             EXPECT_TRUE(draft.IsFinale(finale)) << label;
             EXPECT_EQ(draft.GetTension(finale + draft.GetFinaleWindow()),
                       tension::TensionLevel::Climax)
                 << label;
             const std::size_t figure = text.find("following it at ");
-            EXPECT_EQ(figure != std::string::npos, shape.name != std::string("flat")) << label;
+            EXPECT_EQ(figure != std::string::npos, name != "flat") << label;
             if (figure != std::string::npos)
             {
                 EXPECT_GT(std::atof(text.c_str() + figure + 16), 0.6) << label;
             }
         }
     }
-}
-
-// The peak of one-peak music is the climax, and its finale is on the peak.
-TEST(TensionDraft, TheClimaxAndItsFinaleStandOnThePeak)
-{
-    std::vector<double> loudness(200, -30.0);
-    for (int second = 120; second < 135; ++second)
-        loudness[std::size_t(second)] = second == 127 ? -8.0 : -12.0;
-    const tension::LoudnessTimeline laid = tension::LayTimeline(loudness, 200.0f);
-    EXPECT_EQ(laid.finaleSecond, 127);
-    tension::TensionLevel at127 = tension::TensionLevel::Normal;
-    for (const tension::LevelChange& change : laid.changes)
-    {
-        if (change.second <= 127)
-            at127 = change.level;
-    }
-    EXPECT_EQ(at127, tension::TensionLevel::Climax);
 }
 
 // The draft's file-name entry: the music's name within forty bytes, never
@@ -143,30 +119,20 @@ TEST(DraftPathFor, IsTheMissingTensionFileOrTheMusicsTextFileNeverOneThatStands)
     const std::string music = folder.File("m.wav"), stands = folder.File("stands.txt");
     testing_support::WriteBytes(stands, {1});
     testing_support::WriteBytes(folder.File("kept.txt"), {1});
-    const std::string so = "\x83\x5C";
-    const struct
-    {
-        std::string music, tension;
-        bool opened;
-        float length;
-        std::size_t limit;
-        std::string path;
-    } rows[] = {
-        {music, "", true, 120.0f, 259, folder.File("m.txt")},
-        {music, folder.File("x.txt"), true, 120.0f, 259, folder.File("x.txt")},
-        {music, stands, true, 120.0f, 259, ""},
-        {folder.File("kept.ogg"), "", true, 120.0f, 259, ""},
-        {folder.File("no-extension"), "", true, 60.0f, 259, folder.File("no-extension.txt")},
-        {folder.File("a\\b.c") + so, "", true, 480.0f, 259, folder.File("a\\b.txt")},
-        {music, "", false, 120.0f, 259, ""},
-        {music, "", true, 59.9f, 259, ""},
-        {music, "", true, 480.5f, 259, ""},
-        {music, "", true, 120.0f, folder.File("m.txt").size() - 1, ""},
-    };
-    for (const auto& row : rows)
-        EXPECT_EQ(tension::DraftPathFor(row.music, row.tension, row.opened, row.length, row.limit),
-                  row.path)
-            << row.music << " " << row.tension;
+    const std::string m = folder.File("m.txt"), so = "\x83\x5C";
+    const auto path = [&](const std::string& musicPath, const std::string& tension = "",
+                          float length = 120.0f, bool opened = true, std::size_t limit = 259)
+    { return tension::DraftPathFor(musicPath, tension, opened, length, limit); };
+    EXPECT_EQ(path(music), m);
+    EXPECT_EQ(path(music, folder.File("x.txt")), folder.File("x.txt"));
+    EXPECT_EQ(path(music, stands), "");
+    EXPECT_EQ(path(folder.File("kept.ogg")), "");
+    EXPECT_EQ(path(folder.File("no-extension"), "", 60.0f), folder.File("no-extension.txt"));
+    EXPECT_EQ(path(folder.File("a\\b.c") + so, "", 480.0f), folder.File("a\\b.txt"));
+    EXPECT_EQ(path(music, "", 120.0f, false), "");
+    EXPECT_EQ(path(music, "", 59.9f), "");
+    EXPECT_EQ(path(music, "", 480.5f), "");
+    EXPECT_EQ(path(music, "", 120.0f, true, m.size() - 1), "");
 }
 
 } // namespace
