@@ -97,17 +97,18 @@ std::vector<std::string> LogLines(const std::string& log)
 // to its loudest value, with the finale's window across it.
 template <typename Place> std::string LoudnessCurve(const CheckFigures& figures, const Place& x)
 {
-    const auto [low, high] = std::minmax_element(figures.loudness.begin(), figures.loudness.end());
+    const auto extremes = std::minmax_element(figures.loudness.begin(), figures.loudness.end());
+    const double lowest = *extremes.first, highest = *extremes.second;
     // A fade to silence would flatten the rest: the scale spans at most
     // kCurveSpan below the loudest value, and quieter seconds lie on its floor.
-    const double floor = std::max(*low, *high - kCurveSpan);
-    const double range = *high > floor ? *high - floor : 1.0;
+    const double floor = std::max(lowest, highest - kCurveSpan);
+    const double range = highest > floor ? highest - floor : 1.0;
     const auto y = [&](double value)
-    { return kCurveTop + kCurveHeight * (*high - std::max(value, floor)) / range; };
+    { return kCurveTop + kCurveHeight * (highest - std::max(value, floor)) / range; };
     std::string svg = "<g id=\"loudness\">\n";
     svg +=
         Text(kLeft, kCurveTop - 8,
-             "short-term loudness, " + Number(*low) + " to " + Number(*high) + " LUFS; " +
+             "short-term loudness, " + Number(lowest) + " to " + Number(highest) + " LUFS; " +
                  (figures.hasFigure ? "rank correlation with the levels " + Number(figures.figure)
                                     : std::string("no rank correlation")),
              " font-size=\"12\"");
