@@ -25,14 +25,9 @@ std::string Utf8FromNative(std::string_view text);
 // replaced by a near match.
 bool Cp932FromUtf8(std::string_view utf8, std::string* cp932);
 
-// Text read from standard input or a file, such as JSON that show printed:
-// UTF-8 is taken as it is; on Windows anything else is read in the
-// console's code page, which show prints in.
-std::string Utf8FromInput(std::string_view bytes);
-
 // Prints UTF-8 text as the platform's console shows it: UTF-8 on Linux, the
-// console's code page on Windows.
-void WriteConsoleText(std::FILE* stream, std::string_view utf8);
+// console's code page on Windows. False when it could not all be written.
+bool WriteConsoleText(std::FILE* stream, std::string_view utf8);
 
 // The number of bytes of the code page 932 character at the start of
 // `text`: 2 for a lead byte followed by a trail byte, else 1 (0 when empty).

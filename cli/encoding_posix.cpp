@@ -78,20 +78,15 @@ bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
     return true;
 }
 
-std::string Utf8FromInput(std::string_view bytes)
-{
-    return std::string(bytes);
-}
-
 std::string Utf8FromNative(std::string_view text)
 {
     return std::string(text);
 }
 
-void WriteConsoleText(std::FILE* stream, std::string_view utf8)
+bool WriteConsoleText(std::FILE* stream, std::string_view utf8)
 {
-    std::fwrite(utf8.data(), 1, utf8.size(), stream);
-    std::fflush(stream);
+    const bool written = std::fwrite(utf8.data(), 1, utf8.size(), stream) == utf8.size();
+    return std::fflush(stream) == 0 && written;
 }
 
 } // namespace cli

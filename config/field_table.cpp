@@ -42,7 +42,8 @@ constexpr FieldDescription Field(const char* name, FieldKind kind, Section secti
             0,
             FieldLabel::None,
             DefaultRule::Constant,
-            defaultValue};
+            defaultValue,
+            ~std::uint32_t(0)};
 }
 
 constexpr FieldDescription TextField(const char* name, Section section, std::size_t offset,
@@ -70,6 +71,16 @@ using M = ConfigGame;
 using N = ConfigNetwork;
 using K = ConfigKeys;
 using FK = FieldKind;
+
+// The controller page never assigns a stick direction: neither a capture
+// nor an exchange moves the codes of actions 4 to 7 and 9 to 12.
+constexpr std::uint32_t kStickDirectionActions = 0xF0 | 0x1E00;
+
+constexpr FieldDescription Offering(FieldDescription field, std::uint32_t offered)
+{
+    field.offered = offered;
+    return field;
+}
 
 constexpr std::size_t kButtonsOffset = offsetof(K, padConfigs) + offsetof(PadConfig, buttons);
 constexpr std::size_t kDeviceOffset = offsetof(K, padConfigs) + offsetof(PadConfig, device);
@@ -134,10 +145,11 @@ const FieldDescription kFields[] = {
     Indexed(
         Field("keys.keyboardKeys[]", FK::KeyCode, Section::Keys, offsetof(K, keyboardKeys), 4, 0),
         kActionCount, 4, FieldLabel::Action, DefaultRule::KeyboardTable),
-    Indexed(Indexed(Field("keys.padConfigs[].buttons[]", FK::PadButton, Section::Keys,
-                          kButtonsOffset, 4, 0),
-                    kPlayerCount, sizeof(PadConfig), FieldLabel::None),
-            kActionCount, 4, FieldLabel::Action, DefaultRule::LastIndex),
+    Offering(Indexed(Indexed(Field("keys.padConfigs[].buttons[]", FK::PadButton, Section::Keys,
+                                   kButtonsOffset, 4, 0),
+                             kPlayerCount, sizeof(PadConfig), FieldLabel::None),
+                     kActionCount, 4, FieldLabel::Action, DefaultRule::LastIndex),
+             ~kStickDirectionActions),
     Indexed(Field("keys.padConfigs[].device", FK::Controller, Section::Keys, kDeviceOffset, 1, 0),
             kPlayerCount, sizeof(PadConfig), FieldLabel::Player, DefaultRule::LastIndex),
 
@@ -357,6 +369,13 @@ std::span<const FieldDescription> Fields()
 int IndexCount(const FieldDescription& field)
 {
     return field.counts[0] == 0 ? 0 : field.counts[1] == 0 ? 1 : 2;
+}
+
+bool IsOffered(const FieldAt& at)
+{
+    const int indices = IndexCount(*at.field);
+    const int last = indices == 0 ? 0 : at.index[indices - 1];
+    return (at.field->offered >> last & 1) != 0;
 }
 
 bool IsListKind(FieldKind kind)
