@@ -20,6 +20,11 @@ std::string Utf8FromCp932(std::string_view text);
 // Windows.
 std::string Utf8FromNative(std::string_view text);
 
+// A path given in UTF-8 as the system's functions open it: as it is on
+// Linux, in the ANSI code page on Windows. False when that code page has no
+// form for one of its characters: nothing is replaced by a near match.
+bool NativeFromUtf8(std::string_view utf8, std::string* native);
+
 // A text given in UTF-8 as the tool's code page stores it. False when the
 // text is not UTF-8 or a character has no code page 932 form: nothing is
 // replaced by a near match.

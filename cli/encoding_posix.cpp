@@ -78,6 +78,12 @@ bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
     return true;
 }
 
+bool NativeFromUtf8(std::string_view utf8, std::string* native)
+{
+    *native = std::string(utf8);
+    return true;
+}
+
 std::string Utf8FromNative(std::string_view text)
 {
     return std::string(text);

@@ -60,11 +60,15 @@ std::string Utf8FromCp932(std::string_view text)
     return converted;
 }
 
-bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
+namespace
+{
+
+// Refuses what the code page cannot hold instead of a near match or '?'.
+bool StrictlyFromUtf8(std::string_view utf8, UINT codePage, std::string* out)
 {
     if (utf8.empty())
     {
-        cp932->clear();
+        out->clear();
         return true;
     }
     const int length = MultiByteToWideChar(CP_UTF8, MB_ERR_INVALID_CHARS, utf8.data(),
@@ -74,18 +78,35 @@ bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
     std::wstring wide(static_cast<std::size_t>(length), L'\0');
     MultiByteToWideChar(CP_UTF8, 0, utf8.data(), static_cast<int>(utf8.size()), wide.data(),
                         length);
+    if (codePage == CP_UTF8)
+    {
+        *out = std::string(utf8);
+        return true;
+    }
     BOOL replaced = FALSE;
-    const int bytes = WideCharToMultiByte(932, WC_NO_BEST_FIT_CHARS, wide.data(), length, nullptr,
-                                          0, nullptr, &replaced);
+    const int bytes = WideCharToMultiByte(codePage, WC_NO_BEST_FIT_CHARS, wide.data(), length,
+                                          nullptr, 0, nullptr, &replaced);
     if (bytes <= 0 || replaced)
         return false;
     std::string converted(static_cast<std::size_t>(bytes), '\0');
-    WideCharToMultiByte(932, WC_NO_BEST_FIT_CHARS, wide.data(), length, converted.data(), bytes,
-                        nullptr, &replaced);
+    WideCharToMultiByte(codePage, WC_NO_BEST_FIT_CHARS, wide.data(), length, converted.data(),
+                        bytes, nullptr, &replaced);
     if (replaced)
         return false;
-    *cp932 = std::move(converted);
+    *out = std::move(converted);
     return true;
+}
+
+} // namespace
+
+bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
+{
+    return StrictlyFromUtf8(utf8, 932, cp932);
+}
+
+bool NativeFromUtf8(std::string_view utf8, std::string* native)
+{
+    return StrictlyFromUtf8(utf8, GetACP(), native);
 }
 
 std::string Utf8FromNative(std::string_view text)

@@ -209,7 +209,7 @@ int Set(const Invocation& invocation)
     for (const std::string& assignment : invocation.assignments)
     {
         SettingChange change;
-        ReadAssignment(Utf8FromNative(assignment), &change);
+        ReadAssignment(assignment, &change);
         changes.push_back(std::move(change));
     }
     return ChangeSettings(invocation, changes);
@@ -329,7 +329,17 @@ int RunVekcfg(int argc, const char* const* argv)
         ParseCommandLine(std::vector<std::string>(argv, argv + (argc > 0 ? argc : 0)));
     if (!parsed.valid)
         return UsageError(parsed.error);
-    const Invocation& invocation = parsed.invocation;
+    Invocation invocation = parsed.invocation;
+    // Paths are opened as the system's functions take them.
+    for (std::string* path :
+         {&invocation.musicPath, &invocation.tensionPath, &invocation.svgPath,
+          &invocation.settingsPath, &invocation.jsonPath, &invocation.outputPath})
+    {
+        const std::string given = *path;
+        if (!NativeFromUtf8(given, path))
+            return UsageError("the path \"" + given +
+                              "\" has a character the system's code page has no form for");
+    }
     switch (invocation.command)
     {
     case Command::Help:

@@ -222,16 +222,6 @@ TEST_F(Commands, UsageErrorsAndUnreadableFilesExitTwoWithTheReason)
     }
 }
 
-// An argument as the platform's command line gives it.
-std::string Native(const char8_t* utf8)
-{
-    std::string text = Utf8(utf8);
-#ifdef _WIN32
-    cli::Cp932FromUtf8(Utf8(utf8), &text);
-#endif
-    return text;
-}
-
 // Every page changed, each setting by its number or by what it means.
 std::vector<std::string> ChangeEveryPage(const std::string& file)
 {
@@ -239,12 +229,12 @@ std::vector<std::string> ChangeEveryPage(const std::string& file)
             "game.seVolume=-12.50 dB", "keys.keyboardKeys[4]=Z", "keys.keyboardKeys[14]=up",
             "keys.padConfigs[1].buttons[14]=BUTTON3", "keys.padConfigs[1].buttons[16]=14",
             "keys.padConfigs[3].device=0", "radioChat.entries[1].notToAll=not to everyone",
-            "radioChat.entries[11].text=" + Native(u8"援護を頼む"), "network.keyResponse=2",
-            "network.lobbyId=" + Native(u8"ロビー"), "network.connectList+=192.168.1.*",
+            "radioChat.entries[11].text=" + Utf8(u8"援護を頼む"), "network.keyResponse=2",
+            "network.lobbyId=" + Utf8(u8"ロビー"), "network.connectList+=192.168.1.*",
             // Listed when added, but its slot counts as free.
             "network.connectList+=*.*.*.*", "network.allowList+=10.0.0.1",
             "network.allowList+=10.0.0.2", "network.allowList-=010.0.0.1",
-            "replay.replayLock[29]=1", "userBgm.rows[9].musicPath=" + Native(u8"C:\\音楽\\曲.ogg")};
+            "replay.replayLock[29]=1", "userBgm.rows[9].musicPath=" + Utf8(u8"C:\\音楽\\曲.ogg")};
 }
 
 TEST_F(Commands, SetTakesANumberOrAMeaningAndShowReadsItBack)

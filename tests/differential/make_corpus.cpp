@@ -33,6 +33,8 @@ struct Corpus
         testing_support::WriteBytes((folder / name).string(), {bytes.begin(), bytes.end()});
     }
     void Case(const std::string& command) { cases << command << '\n'; }
+    // A command with text in UTF-8, as a terminal gives it.
+    void Case(const char8_t* command) { Case(reinterpret_cast<const char*>(command)); }
 };
 
 std::string CrLf(const std::string& text)
@@ -165,6 +167,28 @@ void SettingsFiles(Corpus& corpus)
     std::memset(record.Network()->connectList[0].octets, '9',
                 sizeof record.Network()->connectList[0]);
     corpus.Write("unterminated.dat", record.SaveToBytes());
+
+    // Every page changed, Japanese texts among them, and the defaults it is
+    // copied onto through show --json and apply.
+    config::CSaveConfig changed;
+    changed.ResetAll();
+    corpus.Write("defaults.dat", changed.SaveToBytes());
+    const config::IpEntry entry{{"192", "168", "001", "*"}};
+    changed.AddConnectEntry(entry);
+    changed.AddAllowEntry(entry);
+    changed.AddDenyEntry(entry);
+    changed.Graphics()->screenSize = 8;
+    changed.Game()->bgmVolume = -10000;
+    changed.Keys()->keyboardKeys[14] = 0x2D;
+    changed.Keys()->keyboardKeys[16] = 0x2C;
+    std::strcpy(changed.Network()->lobbyId, "ロビー～");
+    std::strcpy(changed.RadioChat()->entries[0].text, "了解！表示");
+    std::strcpy(changed.UserBgm()->rows[0].musicPath, "C:\\音楽\\曲.ogg");
+    corpus.Write("every-page.dat", changed.SaveToBytes());
+    corpus.Write("japanese.json",
+                 std::string(R"({"network": {"directId": "\u30c0\u30a4\u30ec\u30af\u30c8"},)") +
+                     reinterpret_cast<const char*>(
+                         u8R"( "radioChat": {"entries": [{"text": "援護を頼む"}]}})"));
 }
 
 } // namespace
@@ -203,6 +227,10 @@ int main(int argc, char** argv)
     corpus.Case("set rows.dat graphics.screenSize=1280x960 keys.keyboardKeys[4]=Z "
                 "keys.keyboardKeys[14]=UP radioChat.entries[1].text=roger");
     corpus.Case("set rows.dat graphics.screenSize=1280x961");
+    corpus.Case(u8"set defaults.dat radioChat.entries[2].text=了解！ network.lobbyId=ロビー～");
+    corpus.Case(u8"set defaults.dat radioChat.entries[2].text=😀");
+    corpus.Case("apply defaults.dat japanese.json");
+    corpus.Case("show defaults.dat");
     corpus.Case("show rows.dat");
     return 0;
 }
