@@ -1,11 +1,10 @@
 #include "config/field_table.h"
 
 #include "base/cp932.h"
+#include "codes/input_codes.h"
 #include "config/fixed_text.h"
 #include "config/ip_address.h"
 #include "config/volume.h"
-#include "input/name_tables.h"
-#include "input/pad_frame.h"
 
 #include <charconv>
 #include <cstdio>

@@ -1,6 +1,6 @@
 #include "input/direct_input.h"
 
-#include "input/name_tables.h"
+#include "codes/input_codes.h"
 
 namespace input
 {

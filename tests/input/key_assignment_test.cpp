@@ -62,7 +62,7 @@ TEST(KeyCapture, AKeyGoesToTheFocusedActionAndItsOwnerGetsTheFormerKey)
         EXPECT_EQ(Outcome(capture), std::make_pair(changes, next)) << "focused " << int(focused);
         config::ConfigKeys stored = keys;
         std::int8_t focus = focused;
-        ApplyKeyCapture(capture, stored, focus);
+        ApplyKeyCapture(capture, stored.keyboardKeys, focus);
         for (const auto& [action, code] : changes)
             EXPECT_EQ(stored.keyboardKeys[action], code);
         EXPECT_EQ(focus, next < 0 ? focused : next);
@@ -97,7 +97,7 @@ TEST(PadCapture, AButtonIsExchangedWithItsActionOrStoredAloneAndSticksAreNever)
     {
         InputSlot slot;
         ResetSlot(slot, 0, true);
-        BindPlayerToSlot(keys.padConfigs[0], slot);
+        BindPlayerToSlot(keys.padConfigs[0].buttons, keys.padConfigs[0].device, slot);
         if (pressed >= 0)
             slot.pressed[kFirstVirtualButton + pressed] = 1;
         std::uint8_t raw[kCaptureJoyButtons] = {};
@@ -111,7 +111,7 @@ TEST(PadCapture, AButtonIsExchangedWithItsActionOrStoredAloneAndSticksAreNever)
         // counts as already down: held on, it presses no further action.
         config::PadConfig player = keys.padConfigs[0];
         std::int8_t focus = focused;
-        ApplyPadCapture(capture, player, slot, focus);
+        ApplyPadCapture(capture, player.buttons, slot, focus);
         for (const auto& [action, code] : changes)
             EXPECT_EQ(std::make_pair(slot.joyMap[action], slot.xinputMap[action]),
                       std::make_pair(code, player.buttons[action]));

@@ -1,4 +1,4 @@
-#include "input/name_tables.h"
+#include "codes/input_codes.h"
 
 #include <array>
 
