@@ -96,6 +96,7 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     joystick.rgdwPOV[0] = 4500;
     Devices().xinputConnected[1] = true;
     Devices().xinput[1].Gamepad = {XINPUT_GAMEPAD_B, 0, 0, 0, 0, 0, 0};
+    EXPECT_EQ(in.GetJoystickState(1)->rgdwPOV[0], 0xFFFFFFFFu) << "released before its first read";
     in.Update();
     EXPECT_EQ(in.GetJoystickCount(), 2);
     EXPECT_TRUE(in.GetJoystickInfo(0) == nullptr && in.GetJoystickState(0) == nullptr);
@@ -133,6 +134,10 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     Devices().xinputConnected[0] = false;
     in.Update();
     EXPECT_EQ(slot0.analogValid, 0u) << "unplugged, with no controller of its own";
+    Devices().foreground = false;
+    in.Update();
+    EXPECT_EQ(in.GetJoyButton(1, 0) * 2 + (in.GetJoystickState(1)->rgdwPOV[0] != 0xFFFFFFFFu), 0)
+        << "released in the background, the POV centred";
 }
 
 TEST_F(InputUpdate, CapturesReadTheLiveDevices)
