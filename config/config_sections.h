@@ -4,7 +4,7 @@
 // section's payload in the file, padding included; the game reads the same
 // bytes, so every size and offset is pinned below.
 
-#include "codes/input_codes.h"
+#include "base/input_codes.h"
 
 #include <cstddef>
 #include <cstdint>

@@ -1,7 +1,7 @@
 #include "config/field_table.h"
 
 #include "base/cp932.h"
-#include "codes/input_codes.h"
+#include "base/input_codes.h"
 #include "config/fixed_text.h"
 #include "config/ip_address.h"
 #include "config/volume.h"

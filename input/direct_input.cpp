@@ -1,6 +1,6 @@
 #include "input/direct_input.h"
 
-#include "codes/input_codes.h"
+#include "base/input_codes.h"
 
 namespace input
 {

@@ -1,6 +1,6 @@
 #include "input/key_assignment.h"
 
-#include "codes/input_codes.h"
+#include "base/input_codes.h"
 
 namespace input
 {

@@ -3,7 +3,7 @@
 // What a key or button capture on the key assignment pages changes. The
 // pages only show the outcome: the new names in the edit boxes and the focus.
 
-#include "codes/input_codes.h"
+#include "base/input_codes.h"
 #include "input/input.h"
 #include "input/input_slot.h"
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "codes/input_codes.h"
+#include "base/input_codes.h"
 #include "input/device_types.h"
 
 #include <cstdint>

@@ -1,4 +1,4 @@
-#include "codes/input_codes.h"
+#include "base/input_codes.h"
 
 #include <array>
 
