@@ -1,7 +1,6 @@
 // make_fuzz_corpus <folder>: replaces the seeds in <folder>/<target>/ with a
 // few well-formed files of each kind, from the record's image writer and the
 // tests' RIFF and Ogg Vorbis writers; the fuzzer and its dictionary break them.
-#include "cli/settings_report.h"
 #include "config/save_config.h"
 #include "fuzz/fuzz_support.h"
 #include "tests/support/audio_fixtures.h"
@@ -28,18 +27,6 @@ void Write(const fs::path& root, const char* target,
     for (const auto& [name, bytes] : seeds)
         std::ofstream(root / target / name, std::ios::binary)
             .write(reinterpret_cast<const char*>(bytes.data()), std::streamsize(bytes.size()));
-}
-
-Bytes Shown(const config::CSaveConfig& record)
-{
-    const std::string json =
-        cli::SettingsJson(cli::DescribeSettings(record, "GameConfig.dat", config::kFileVersion));
-    return Bytes(json.begin(), json.end());
-}
-
-Bytes Text(const std::string& text)
-{
-    return Bytes(text.begin(), text.end());
 }
 
 Bytes Tension(double seconds, const std::string& text)
@@ -70,36 +57,6 @@ int main(int argc, char** argv)
     Write(
         root, "fuzz_settings",
         {{"defaults", defaults}, {"first-version", firstVersion}, {"lists", record.SaveToBytes()}});
-
-    // What show --json prints of the defaults and of a file with every page
-    // changed, a tree in part, and arguments of set.
-    config::CSaveConfig defaultRecord;
-    defaultRecord.ResetAll();
-    record.AddConnectEntry(entry);
-    record.Graphics()->screenSize = 8;
-    record.Game()->seVolume = -1250;
-    record.Game()->bgmVolume = -10000;
-    record.Keys()->keyboardKeys[14] = 0x2D;
-    record.Keys()->keyboardKeys[16] = 0x2C;
-    record.Keys()->padConfigs[1].buttons[14] = 0;
-    record.Keys()->padConfigs[1].buttons[0] = 14;
-    record.Replay()->replayLock[29] = 1;
-    record.RadioChat()->entries[0].notToAll = 1;
-    std::strcpy(record.RadioChat()->entries[0].text, "了解！");
-    std::strcpy(record.Network()->lobbyId, "ロビー");
-    Write(
-        root, "fuzz_apply",
-        {{"defaults", Shown(defaultRecord)},
-         {"every-page", Shown(record)},
-         {"in-part",
-          Text(R"({"graphics": {"fullScreen": "on"}, "network": {"allowList": [)"
-               R"("10.0.*.1", {"value": "1.2.3.4"}]}, "keys": {"padConfigs": [)"
-               R"({"device": 1, "buttons": [{"value": 14}, 1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12, )"
-               R"(13, "DP_UP"]}]}})")},
-         {"set", Text("set\ngraphics.screenSize=1280x960\nkeys.keyboardKeys[4]=Z\n"
-                      "keys.keyboardKeys[14]=UP\nnetwork.connectList+=192.168.1.*\n"
-                      "network.allowList-=192.168.0.*\ngame.bgmVolume=-12.50 dB\n"
-                      "radioChat.entries[1].text=援護を頼む")}});
 
     Write(root, "fuzz_tension",
           {{"worked-example", Tension(180, "FILENAME:Test;\nLOW:30;\nHI:60;\nLOW:90;\n"

@@ -168,23 +168,9 @@ void SettingsFiles(Corpus& corpus)
                 sizeof record.Network()->connectList[0]);
     corpus.Write("unterminated.dat", record.SaveToBytes());
 
-    // Every page changed, Japanese texts among them, and the defaults it is
-    // copied onto through show --json and apply.
-    config::CSaveConfig changed;
-    changed.ResetAll();
-    corpus.Write("defaults.dat", changed.SaveToBytes());
-    const config::IpEntry entry{{"192", "168", "001", "*"}};
-    changed.AddConnectEntry(entry);
-    changed.AddAllowEntry(entry);
-    changed.AddDenyEntry(entry);
-    changed.Graphics()->screenSize = 8;
-    changed.Game()->bgmVolume = -10000;
-    changed.Keys()->keyboardKeys[14] = 0x2D;
-    changed.Keys()->keyboardKeys[16] = 0x2C;
-    std::strcpy(changed.Network()->lobbyId, "ロビー～");
-    std::strcpy(changed.RadioChat()->entries[0].text, "了解！表示");
-    std::strcpy(changed.UserBgm()->rows[0].musicPath, "C:\\音楽\\曲.ogg");
-    corpus.Write("every-page.dat", changed.SaveToBytes());
+    // Changed below by set and apply with Japanese texts.
+    record.ResetAll();
+    corpus.Write("defaults.dat", record.SaveToBytes());
     corpus.Write("japanese.json",
                  std::string(R"({"network": {"directId": "\u30c0\u30a4\u30ec\u30af\u30c8"},)") +
                      reinterpret_cast<const char*>(
