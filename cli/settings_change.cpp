@@ -36,8 +36,9 @@ bool ToCp932(const std::string& utf8, std::string* cp932, const std::string& nam
 {
     if (Cp932FromUtf8(utf8, cp932))
         return true;
-    return Refuse(refusal, name,
-                  Quoted(utf8) + " holds a character that code page 932 has no form for", field);
+    // Not quoted: a console could not show the character either.
+    return Refuse(refusal, name, "the text holds a character that code page 932 has no form for",
+                  field);
 }
 
 bool ReadAddress(const std::string& text, bool emptyAllowed, config::IpEntry* entry,
