@@ -69,9 +69,10 @@ protected:
         Write(example, "FILENAME:Test;\nLOW:30;\nHI:60;\nLOW:90;\nCLIMAX:165;\nFINALE:170;\n");
         Write(climax, "FILENAME:Test;\nLOW:30;\nHI:60;\nLOW:90;\nCLIMAX:150;\nFINALE:170;\n");
     }
-    static void Write(const std::string& path, const std::string& bytes)
+    static std::string Write(const std::string& path, const std::string& bytes)
     {
         testing_support::WriteBytes(path, std::vector<std::uint8_t>(bytes.begin(), bytes.end()));
+        return path;
     }
 
     testing_support::TempFolder folder;
@@ -202,27 +203,25 @@ TEST_F(Commands, ShowPrintsEverySettingByNameWithItsMeaning)
     EXPECT_TRUE(std::all_of(json.out.begin(), json.out.end(), [](char c) { return c > 0; }));
 }
 
-// Every page changed, each setting by its number or by what it means.
-std::vector<std::string> ChangeEveryPage(const std::string& file)
-{
-    return {"set", file, "graphics.screenSize=1280x960", "graphics.fullScreen=on",
-            "game.seVolume=-12.50 dB", "keys.keyboardKeys[4]=Z", "keys.keyboardKeys[14]=up",
-            "keys.padConfigs[1].buttons[14]=BUTTON3", "keys.padConfigs[1].buttons[16]=14",
-            "keys.padConfigs[3].device=0", "radioChat.entries[1].notToAll=not to everyone",
-            "radioChat.entries[11].text=" + Utf8(u8"援護を頼む"), "network.keyResponse=2",
-            "network.lobbyId=" + Utf8(u8"ロビー"), "network.connectList+=192.168.1.*",
-            // Listed when added, but its slot counts as free.
-            "network.connectList+=*.*.*.*", "network.allowList+=10.0.0.1",
-            "network.allowList+=10.0.0.2", "network.allowList-=010.0.0.1",
-            "replay.replayLock[29]=1", "userBgm.rows[9].musicPath=" + Utf8(u8"C:\\音楽\\曲.ogg")};
-}
-
-TEST_F(Commands, SetTakesANumberOrAMeaningAndShowReadsItBack)
+// Every page changed, each setting by its number or by what it means; then
+// each file's show --json applied over the other makes it again, byte for byte.
+TEST_F(Commands, SetTakesANumberOrAMeaningAndApplyOfWhatShowPrintsCopiesAFile)
 {
     config::CSaveConfig record;
     record.ResetAll();
-    ASSERT_TRUE(record.SaveToPath(settings.c_str()));
-    const ProgramRun set = Vekcfg(ChangeEveryPage(settings));
+    const std::string defaults = folder.File("defaults.dat"), tree = folder.File("tree.json");
+    ASSERT_TRUE(record.SaveToPath(settings.c_str()) && record.SaveToPath(defaults.c_str()));
+    const ProgramRun set = Vekcfg(
+        {"set", settings, "graphics.screenSize=1280x960", "graphics.fullScreen=on",
+         "game.seVolume=-12.50 dB", "keys.keyboardKeys[4]=Z", "keys.keyboardKeys[14]=up",
+         "keys.padConfigs[1].buttons[14]=BUTTON3", "keys.padConfigs[1].buttons[16]=14",
+         "keys.padConfigs[3].device=0", "radioChat.entries[1].notToAll=not to everyone",
+         "radioChat.entries[11].text=" + Utf8(u8"援護を頼む"), "network.keyResponse=2",
+         "network.lobbyId=" + Utf8(u8"ロビー"), "network.connectList+=192.168.1.*",
+         // Listed when added, but its slot counts as free.
+         "network.connectList+=*.*.*.*", "network.allowList+=10.0.0.1",
+         "network.allowList+=10.0.0.2", "network.allowList-=010.0.0.1", "replay.replayLock[29]=1",
+         "userBgm.rows[9].musicPath=" + Utf8(u8"C:\\音楽\\曲.ogg")});
     EXPECT_EQ(set.exitCode, 0) << set.err;
     EXPECT_EQ(set.out + set.err, "");
     const std::string out = Vekcfg({"show", settings}).out;
@@ -234,6 +233,15 @@ TEST_F(Commands, SetTakesANumberOrAMeaningAndShowReadsItBack)
              u8"userBgm.rows[9].musicPath = \"C:\\音楽\\曲.ogg\"\n",
          })
         EXPECT_NE(out.find(Utf8(line)), std::string::npos) << Utf8(line);
+    const std::vector<std::uint8_t> changed = ReadBytes(settings), initial = ReadBytes(defaults);
+    const std::string trees[] = {Vekcfg({"show", "--json", settings}).out,
+                                 Vekcfg({"show", "--json", defaults}).out};
+    for (int i = 0; i < 2; ++i)
+    {
+        Write(tree, trees[i]);
+        EXPECT_EQ(Vekcfg({"apply", i == 0 ? defaults : settings, tree}).err, "");
+    }
+    EXPECT_TRUE(ReadBytes(defaults) == changed && ReadBytes(settings) == initial);
 }
 
 // One row per rule that refuses a command or a change: every refusal exits 2
@@ -247,16 +255,12 @@ TEST_F(Commands, EveryKindOfRefusalExitsTwoNamingTheSettingAndLeavesTheFile)
     const std::vector<std::uint8_t> image = ReadBytes(settings);
     int files = 0;
     const auto file = [&](const std::string& bytes)
-    {
-        const std::string path = folder.File("f" + std::to_string(files++));
-        Write(path, bytes);
-        return path;
-    };
+    { return Write(folder.File("f" + std::to_string(files++)), bytes); };
     // The settings image with `bytes` at `offset` and its last `cut` bytes gone.
     const auto patched = [&](const std::string& bytes, std::size_t offset, std::size_t cut = 0)
     {
-        std::string content(image.begin(), image.end() - static_cast<std::ptrdiff_t>(cut));
-        return file(content.replace(offset, bytes.size(), bytes));
+        return file(
+            std::string(image.begin(), image.end() - cut).replace(offset, bytes.size(), bytes));
     };
     const auto apply = [&](const std::string& json) {
         return std::vector<std::string>{"apply", settings, file(json)};
