@@ -1,5 +1,6 @@
 #include "cli/json.h"
 
+#include <new>
 #include <unordered_set>
 #include <vector>
 
@@ -63,15 +64,21 @@ bool ReadJson(std::string_view text, Json* value, std::string* error)
     {
         *error = refusal.reason;
     }
-    catch (const Json::parse_error& parseError)
+    // A syntax error, or a number beyond a double (out_of_range).
+    catch (const Json::exception& exception)
     {
         // "[json.exception.parse_error.101] parse error at line 1, column 3: ...;
         // last read: '...'", without the bytes read, which need not be text.
-        std::string what = parseError.what();
-        const std::string at = "parse error at ";
-        const std::size_t start = what.find(at);
-        what = start == std::string::npos ? what : what.substr(start + at.size());
+        std::string what = exception.what();
+        const std::size_t start = what.find("] ");
+        what = start == std::string::npos ? what : what.substr(start + 2);
+        if (what.starts_with("parse error at "))
+            what = what.substr(std::string_view("parse error at ").size());
         *error = what.substr(0, what.find("; last read:"));
+    }
+    catch (const std::bad_alloc&)
+    {
+        *error = "out of memory for its values";
     }
     return false;
 }

@@ -318,6 +318,7 @@ TEST_F(Commands, EveryKindOfRefusalExitsTwoNamingTheSettingAndLeavesTheFile)
         {"JSON true for a switch", apply(R"({"graphics": {"fullScreen": true}})"), "fullScreen: "},
         {"JSON number for a text", apply(R"({"network": {"lobbyId": 1}})"), "lobbyId: "},
         {"a fraction", apply(R"({"network": {"port": 1.5}})"), "not a whole number"},
+        {"a number beyond a double", apply("[1E400]"), "number overflow parsing '1E400'"},
         {"a member given twice", apply(R"({"a": 1, "a": 2})"), "\"a\" is given twice"},
         {"deeper than the tree", apply("[[[[[[[1]]]]]]]"), "nested deeper than 6"},
         {"invalid UTF-8", apply("[\"\xC3\"]"), "ill-formed UTF-8"},
