@@ -74,6 +74,11 @@ bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
     if (!done)
         return false;
     converted.resize(converted.size() - outLeft);
+    // iconv maps some characters one way only (U+301C, U+00A5 and others to
+    // forms of other characters), where Windows, asked for no near match,
+    // refuses them: only what converts back unchanged is taken.
+    if (Utf8FromCp932(converted) != utf8)
+        return false;
     *cp932 = std::move(converted);
     return true;
 }

@@ -301,6 +301,8 @@ TEST_F(Commands, EveryKindOfRefusalExitsTwoNamingTheSettingAndLeavesTheFile)
          "entries[0].text: "},
         {"a text code page 932 lacks", apply(R"({"network": {"lobbyId": "\ud83d\ude00"}})"),
          "network.lobbyId: "},
+        {"a near match only (U+301C)", apply(R"({"network": {"directId": "\u301c"}})"),
+         "directId: the text holds"},
         {"a section, not a field", {"set", settings, "graphics=1"}, "graphics"},
         {"a fifth player", {"set", settings, "keys.padConfigs[4].device=0"}, "padConfigs[4]"},
         {"+= on a value", {"set", settings, "graphics.fullScreen+=1"}, "fullScreen: "},

@@ -215,6 +215,7 @@ int main(int argc, char** argv)
     corpus.Case("set rows.dat graphics.screenSize=1280x961");
     corpus.Case(u8"set defaults.dat radioChat.entries[2].text=了解！ network.lobbyId=ロビー～");
     corpus.Case(u8"set defaults.dat radioChat.entries[2].text=😀");
+    corpus.Case(u8"set defaults.dat radioChat.entries[3].text=〜¥");
     corpus.Case("apply defaults.dat japanese.json");
     corpus.Case("show defaults.dat");
     corpus.Case("show rows.dat");
