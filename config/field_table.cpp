@@ -654,7 +654,11 @@ std::string FieldName(const FieldAt& at)
     {
         if (c[0] == '[' && c[1] == ']')
         {
-            name += std::string("[") + Decimal(at.index[dimension++]) + "]";
+            // Appended piece by piece: GCC 12 warns of an overlap that is not
+            // there in the optimised concatenation of three strings.
+            name += '[';
+            name += Decimal(at.index[dimension++]);
+            name += ']';
             ++c;
         }
         else

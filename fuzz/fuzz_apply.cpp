@@ -1,9 +1,8 @@
-// What a user hands to `vekcfg apply` (JSON), or to `vekcfg set` (an input
-// of "set\n" and one NAME=VALUE a line), over a record. Besides never
-// crashing: a refusal leaves the record's image as it was; an accepted
-// change gives no key or button to two actions, saves to an image that
-// loads back to the same bytes, and its own `show --json` applied over the
-// record it started from gives it again, byte for byte.
+// What `vekcfg apply` takes (JSON) and `vekcfg set` takes ("set\n", then one
+// NAME=VALUE a line), over a record: a refusal leaves the record's image as
+// it was; an accepted change gives no code to two actions, saves to an image
+// that loads back the same, and its own `show --json` over the starting
+// record gives it again, byte for byte.
 #include "cli/json.h"
 #include "cli/settings_change.h"
 #include "cli/settings_report.h"

@@ -1,5 +1,4 @@
-// A fuzz target's committed seeds, replayed as a test of the native build:
-// its properties must hold on each.
+// A fuzz target's committed seeds, replayed by the native tests.
 #include <cstdint>
 #include <filesystem>
 #include <fstream>
@@ -8,7 +7,6 @@
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size);
 
-// Only libFuzzer mutates; a custom mutator is never called here.
 extern "C" std::size_t LLVMFuzzerMutate(std::uint8_t*, std::size_t size, std::size_t)
 {
     return size;
