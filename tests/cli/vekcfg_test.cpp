@@ -193,6 +193,7 @@ TEST_F(Commands, ShowPrintsEverySettingByNameWithItsMeaning)
           u8"radioChat.entries[11].notToAll = 0 (F12: to everyone (全体 checked))\n"})
         EXPECT_NE(text.out.find(Utf8(line)), std::string::npos) << Utf8(line);
 
+    EXPECT_EQ(text.out.find("connectList[1]"), std::string::npos) << "empty slots after the last";
     const ProgramRun json = Vekcfg({"show", "--json", settings});
     EXPECT_EQ(json.exitCode, 0);
     // ASCII only, so that any console and pipe pass it on unchanged.

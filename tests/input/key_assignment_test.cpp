@@ -86,6 +86,7 @@ TEST(PadCapture, AButtonIsExchangedWithItsActionOrStoredAloneAndSticksAreNever)
         {9, 14, {}, {{14, 9}, {9, 14}}, 13},
         {12, 14, {}, {{14, 12}, {12, 14}}, 13},
         {9, -1, {12}, {{9, 24}}, 9}, // raw button 12 is BUTTON13
+        {6, -1, {12}, {{6, 24}}, 7}, // stored alone, no skip to the push
         {15, -1, {0}, {}, -1},       // held, but action 14 has it
         {15, -1, {1, 12}, {}, -1},   // the lowest held button decides
         {14, 4, {12}, {}, -1},       // stick directions
