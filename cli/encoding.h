@@ -20,19 +20,19 @@ std::string Utf8FromCp932(std::string_view text);
 // Windows.
 std::string Utf8FromNative(std::string_view text);
 
+// A path given in UTF-8 as the system's functions open it: as it is on
+// Linux, in the ANSI code page on Windows. False when that code page has no
+// form for one of its characters: nothing is replaced by a near match.
+bool NativeFromUtf8(std::string_view utf8, std::string* native);
+
 // A text given in UTF-8 as the tool's code page stores it. False when the
 // text is not UTF-8 or a character has no code page 932 form: nothing is
 // replaced by a near match.
 bool Cp932FromUtf8(std::string_view utf8, std::string* cp932);
 
-// Text read from standard input or a file, such as JSON that show printed:
-// UTF-8 is taken as it is; on Windows anything else is read in the
-// console's code page, which show prints in.
-std::string Utf8FromInput(std::string_view bytes);
-
 // Prints UTF-8 text as the platform's console shows it: UTF-8 on Linux, the
-// console's code page on Windows.
-void WriteConsoleText(std::FILE* stream, std::string_view utf8);
+// console's code page on Windows. False when it could not all be written.
+bool WriteConsoleText(std::FILE* stream, std::string_view utf8);
 
 // The number of bytes of the code page 932 character at the start of
 // `text`: 2 for a lead byte followed by a trail byte, else 1 (0 when empty).

@@ -74,13 +74,19 @@ bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
     if (!done)
         return false;
     converted.resize(converted.size() - outLeft);
+    // iconv maps some characters one way only (U+301C, U+00A5 and others to
+    // forms of other characters), where Windows, asked for no near match,
+    // refuses them: only what converts back unchanged is taken.
+    if (Utf8FromCp932(converted) != utf8)
+        return false;
     *cp932 = std::move(converted);
     return true;
 }
 
-std::string Utf8FromInput(std::string_view bytes)
+bool NativeFromUtf8(std::string_view utf8, std::string* native)
 {
-    return std::string(bytes);
+    *native = std::string(utf8);
+    return true;
 }
 
 std::string Utf8FromNative(std::string_view text)
@@ -88,10 +94,10 @@ std::string Utf8FromNative(std::string_view text)
     return std::string(text);
 }
 
-void WriteConsoleText(std::FILE* stream, std::string_view utf8)
+bool WriteConsoleText(std::FILE* stream, std::string_view utf8)
 {
-    std::fwrite(utf8.data(), 1, utf8.size(), stream);
-    std::fflush(stream);
+    const bool written = std::fwrite(utf8.data(), 1, utf8.size(), stream) == utf8.size();
+    return std::fflush(stream) == 0 && written;
 }
 
 } // namespace cli

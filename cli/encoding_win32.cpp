@@ -23,16 +23,19 @@ std::wstring Wide(std::string_view text, UINT codePage)
     return wide;
 }
 
+// Never a near match: a character the code page lacks becomes its default
+// character, '?'.
 std::string Narrow(const std::wstring& wide, UINT codePage)
 {
     if (wide.empty())
         return std::string();
-    const int length = WideCharToMultiByte(codePage, 0, wide.data(), static_cast<int>(wide.size()),
-                                           nullptr, 0, nullptr, nullptr);
+    const DWORD flags = codePage == CP_UTF8 ? 0 : WC_NO_BEST_FIT_CHARS;
+    const int length = WideCharToMultiByte(
+        codePage, flags, wide.data(), static_cast<int>(wide.size()), nullptr, 0, nullptr, nullptr);
     std::string narrow(static_cast<std::size_t>(length > 0 ? length : 0), '\0');
     if (length > 0)
-        WideCharToMultiByte(codePage, 0, wide.data(), static_cast<int>(wide.size()), narrow.data(),
-                            length, nullptr, nullptr);
+        WideCharToMultiByte(codePage, flags, wide.data(), static_cast<int>(wide.size()),
+                            narrow.data(), length, nullptr, nullptr);
     return narrow;
 }
 
@@ -57,11 +60,15 @@ std::string Utf8FromCp932(std::string_view text)
     return converted;
 }
 
-bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
+namespace
+{
+
+// Refuses what the code page cannot hold instead of a near match or '?'.
+bool StrictlyFromUtf8(std::string_view utf8, UINT codePage, std::string* out)
 {
     if (utf8.empty())
     {
-        cp932->clear();
+        out->clear();
         return true;
     }
     const int length = MultiByteToWideChar(CP_UTF8, MB_ERR_INVALID_CHARS, utf8.data(),
@@ -71,29 +78,35 @@ bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
     std::wstring wide(static_cast<std::size_t>(length), L'\0');
     MultiByteToWideChar(CP_UTF8, 0, utf8.data(), static_cast<int>(utf8.size()), wide.data(),
                         length);
+    if (codePage == CP_UTF8)
+    {
+        *out = std::string(utf8);
+        return true;
+    }
     BOOL replaced = FALSE;
-    const int bytes = WideCharToMultiByte(932, WC_NO_BEST_FIT_CHARS, wide.data(), length, nullptr,
-                                          0, nullptr, &replaced);
+    const int bytes = WideCharToMultiByte(codePage, WC_NO_BEST_FIT_CHARS, wide.data(), length,
+                                          nullptr, 0, nullptr, &replaced);
     if (bytes <= 0 || replaced)
         return false;
     std::string converted(static_cast<std::size_t>(bytes), '\0');
-    WideCharToMultiByte(932, WC_NO_BEST_FIT_CHARS, wide.data(), length, converted.data(), bytes,
-                        nullptr, &replaced);
+    WideCharToMultiByte(codePage, WC_NO_BEST_FIT_CHARS, wide.data(), length, converted.data(),
+                        bytes, nullptr, &replaced);
     if (replaced)
         return false;
-    *cp932 = std::move(converted);
+    *out = std::move(converted);
     return true;
 }
 
-std::string Utf8FromInput(std::string_view bytes)
+} // namespace
+
+bool Cp932FromUtf8(std::string_view utf8, std::string* cp932)
 {
-    if (bytes.empty() || MultiByteToWideChar(CP_UTF8, MB_ERR_INVALID_CHARS, bytes.data(),
-                                             static_cast<int>(bytes.size()), nullptr, 0) > 0)
-        return std::string(bytes);
-    UINT codePage = GetConsoleOutputCP();
-    if (codePage == 0)
-        codePage = GetACP();
-    return Narrow(Wide(bytes, codePage), CP_UTF8);
+    return StrictlyFromUtf8(utf8, 932, cp932);
+}
+
+bool NativeFromUtf8(std::string_view utf8, std::string* native)
+{
+    return StrictlyFromUtf8(utf8, GetACP(), native);
 }
 
 std::string Utf8FromNative(std::string_view text)
@@ -101,7 +114,7 @@ std::string Utf8FromNative(std::string_view text)
     return Narrow(Wide(text, CP_ACP), CP_UTF8);
 }
 
-void WriteConsoleText(std::FILE* stream, std::string_view utf8)
+bool WriteConsoleText(std::FILE* stream, std::string_view utf8)
 {
     // Without a console (output to a file from a detached process) the
     // ANSI code page stands in for it.
@@ -110,8 +123,8 @@ void WriteConsoleText(std::FILE* stream, std::string_view utf8)
         codePage = GetACP();
     const std::string bytes =
         codePage == CP_UTF8 ? std::string(utf8) : Narrow(Wide(utf8, CP_UTF8), codePage);
-    std::fwrite(bytes.data(), 1, bytes.size(), stream);
-    std::fflush(stream);
+    const bool written = std::fwrite(bytes.data(), 1, bytes.size(), stream) == bytes.size();
+    return std::fflush(stream) == 0 && written;
 }
 
 } // namespace cli

@@ -1,54 +1,33 @@
 #pragma once
 
-// A small, strict reader of JSON (UTF-8) for the settings trees that
-// `vekcfg apply` takes: one value with white space around it; no comments,
-// no trailing commas, no duplicate member names, no lone surrogates.
+// JSON as vekcfg reads and writes it, through nlohmann-json: members keep
+// their order, and what is printed is ASCII, every other character as a
+// \u escape, so that it passes any console and pipe unchanged.
 
-#include <cstdint>
+#include <cstddef>
+#include <nlohmann/json.hpp>
 #include <string>
 #include <string_view>
-#include <vector>
 
 namespace cli
 {
 
-struct JsonMember;
+using Json = nlohmann::ordered_json;
 
-struct JsonValue
-{
-    enum class Kind
-    {
-        Null,
-        Boolean,
-        Number,
-        String,
-        Array,
-        Object,
-    };
+// The largest settings tree apply takes: far beyond what show prints for a
+// settings file of the largest size vekcfg reads.
+inline constexpr std::size_t kMaxJsonBytes = std::size_t(64) << 20;
+// As deep as show's tree goes: the root, a section, a list, its element,
+// a list in it and a value with its meaning.
+inline constexpr int kMaxJsonDepth = 6;
 
-    Kind kind = Kind::Null;
-    bool boolean = false;
-    // A number without fraction or exponent that fits is whole.
-    bool whole = false;
-    std::int64_t integer = 0;
-    // The number as written, for messages.
-    std::string number;
-    std::string string;
-    std::vector<JsonValue> items;
-    std::vector<JsonMember> members;
+// One JSON value in UTF-8, with white space around it. Refused, with the
+// reason: anything larger than kMaxJsonBytes or nested deeper than
+// kMaxJsonDepth, invalid UTF-8, a lone surrogate, and a member named twice
+// in one object.
+bool ReadJson(std::string_view text, Json* value, std::string* error);
 
-    // Null when there is no such member.
-    const JsonValue* Member(std::string_view name) const;
-};
-
-struct JsonMember
-{
-    std::string name;
-    JsonValue value;
-};
-
-// False with the reason ("line 3, column 7: ...") when `text` is not one
-// JSON value.
-bool ReadJson(std::string_view text, JsonValue* value, std::string* error);
+// Two spaces of indent, ASCII only.
+std::string WriteJson(const Json& value);
 
 } // namespace cli

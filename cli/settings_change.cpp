@@ -3,6 +3,7 @@
 #include "cli/encoding.h"
 #include "config/field_table.h"
 
+#include <cstdint>
 #include <cstring>
 
 namespace cli
@@ -35,8 +36,9 @@ bool ToCp932(const std::string& utf8, std::string* cp932, const std::string& nam
 {
     if (Cp932FromUtf8(utf8, cp932))
         return true;
-    return Refuse(refusal, name,
-                  Quoted(utf8) + " holds a character that code page 932 has no form for", field);
+    // Not quoted: a console could not show the character either.
+    return Refuse(refusal, name, "the text holds a character that code page 932 has no form for",
+                  field);
 }
 
 bool ReadAddress(const std::string& text, bool emptyAllowed, config::IpEntry* entry,
@@ -102,7 +104,10 @@ bool ChangeList(config::CSaveConfig& record, const config::FieldDescription& fie
             return true;
         }
         for (std::size_t left = config::ReadList(record, kind).size(); left > 0; --left)
-            RemoveEntry(record, kind, static_cast<int>(left - 1));
+        {
+            if (!RemoveEntry(record, kind, static_cast<int>(left - 1)))
+                return Refuse(refusal, name, "the list cannot shrink (out of memory)", field);
+        }
         for (const config::IpEntry& entry : entries)
         {
             if (!AddEntry(record, kind, entry))
@@ -128,8 +133,11 @@ bool ChangeList(config::CSaveConfig& record, const config::FieldDescription& fie
     const std::vector<config::IpEntry> entries = config::ReadList(record, kind);
     for (std::size_t i = 0; i < entries.size(); ++i)
     {
-        if (SameEntry(entries[i], entry))
-            return RemoveEntry(record, kind, static_cast<int>(i));
+        if (!SameEntry(entries[i], entry))
+            continue;
+        if (RemoveEntry(record, kind, static_cast<int>(i)))
+            return true;
+        return Refuse(refusal, name, "the list cannot shrink (out of memory)", field);
     }
     std::string held;
     for (const config::IpEntry& listed : entries)
@@ -176,6 +184,11 @@ bool ChangeValue(config::CSaveConfig& record, const config::FieldAt& at,
         if (!config::ParseValue(at, cp932, &value))
             return Refuse(refusal, name, Quoted(change.text) + " is not allowed", field);
     }
+    // What show prints of an element no page changes comes back unchanged.
+    const std::int64_t present = config::ReadNumber(record, at);
+    if (!config::IsOffered(at) && value != present)
+        return Refuse(refusal, name,
+                      "no page changes this one: it stays " + std::to_string(present), field);
     config::WriteNumber(record, at, value);
     return true;
 }
@@ -209,14 +222,15 @@ bool CheckCodesStayApart(const config::CSaveConfig& record,
     return true;
 }
 
-bool Leaf(const JsonValue& value, const std::string& name, const config::FieldDescription& field,
+bool Leaf(const Json& value, const std::string& name, const config::FieldDescription& field,
           std::vector<SettingChange>* changes, std::string* refusal)
 {
-    const JsonValue* given = &value;
-    if (value.kind == JsonValue::Kind::Object)
+    const Json* given = &value;
+    if (value.is_object())
     {
-        given = value.Member("value");
-        for (const auto& [member, ignored] : value.members)
+        const auto found = value.find("value");
+        given = found != value.end() ? &*found : nullptr;
+        for (const auto& [member, ignored] : value.items())
         {
             if (member != "value" && member != "meaning")
                 given = nullptr;
@@ -229,28 +243,36 @@ bool Leaf(const JsonValue& value, const std::string& name, const config::FieldDe
     change.name = name;
     if (config::IsListKind(field.kind))
     {
-        if (given->kind != JsonValue::Kind::Array)
+        if (!given->is_array())
             return Refuse(refusal, name, "a list of addresses expected", field);
         change.operation = Operation::ReplaceList;
-        for (const JsonValue& item : given->items)
+        for (const Json& item : *given)
         {
-            const JsonValue* address =
-                item.kind == JsonValue::Kind::Object ? item.Member("value") : &item;
-            if (address == nullptr || address->kind != JsonValue::Kind::String)
+            const Json* address = &item;
+            if (item.is_object())
+            {
+                const auto found = item.find("value");
+                address = found != item.end() ? &*found : nullptr;
+            }
+            if (address == nullptr || !address->is_string())
                 return Refuse(refusal, name, "an address is a text", field);
-            change.items.push_back(address->string);
+            change.items.push_back(address->get<std::string>());
         }
     }
-    else if (given->kind == JsonValue::Kind::String)
+    else if (given->is_string())
     {
-        change.text = given->string;
+        change.text = given->get<std::string>();
     }
-    else if (given->kind == JsonValue::Kind::Number && config::IsNumberKind(field.kind))
+    else if (given->is_number() && config::IsNumberKind(field.kind))
     {
-        if (!given->whole)
-            return Refuse(refusal, name, given->number + " is not a whole number", field);
+        if (given->is_number_float())
+            return Refuse(refusal, name, given->dump() + " is not a whole number", field);
+        // Beyond the signed range is beyond every field's range too.
         change.hasNumber = true;
-        change.number = given->integer;
+        change.number =
+            given->is_number_unsigned() && given->get<std::uint64_t>() > std::uint64_t(INT64_MAX)
+                ? INT64_MAX
+                : given->get<std::int64_t>();
     }
     else
     {
@@ -263,7 +285,7 @@ bool Leaf(const JsonValue& value, const std::string& name, const config::FieldDe
     return true;
 }
 
-bool Walk(const JsonValue& value, const std::string& path, std::vector<SettingChange>* changes,
+bool Walk(const Json& value, const std::string& path, std::vector<SettingChange>* changes,
           std::string* refusal)
 {
     if (!path.empty())
@@ -278,9 +300,9 @@ bool Walk(const JsonValue& value, const std::string& path, std::vector<SettingCh
             return false;
         }
     }
-    if (value.kind == JsonValue::Kind::Object)
+    if (value.is_object())
     {
-        for (const auto& [member, item] : value.members)
+        for (const auto& [member, item] : value.items())
         {
             if (path.empty() && (member == "file" || member == "version"))
                 continue;
@@ -289,11 +311,11 @@ bool Walk(const JsonValue& value, const std::string& path, std::vector<SettingCh
         }
         return true;
     }
-    if (value.kind == JsonValue::Kind::Array && !path.empty())
+    if (value.is_array() && !path.empty())
     {
-        for (std::size_t i = 0; i < value.items.size(); ++i)
+        for (std::size_t i = 0; i < value.size(); ++i)
         {
-            if (!Walk(value.items[i], path + "[" + std::to_string(i) + "]", changes, refusal))
+            if (!Walk(value[i], path + "[" + std::to_string(i) + "]", changes, refusal))
                 return false;
         }
         return true;
@@ -301,6 +323,26 @@ bool Walk(const JsonValue& value, const std::string& path, std::vector<SettingCh
     *refusal = path.empty() ? "the settings are not a JSON object"
                             : path + ": a group of settings, not one value";
     return false;
+}
+
+bool ApplyInOrder(config::CSaveConfig& record, const std::vector<SettingChange>& changes,
+                  std::string* refusal)
+{
+    std::vector<config::FieldAt> codes;
+    for (const SettingChange& change : changes)
+    {
+        config::FieldAt at;
+        if (!config::FindField(change.name, &at, refusal))
+            return false;
+        const bool changed = config::IsListKind(at.field->kind)
+                                 ? ChangeList(record, *at.field, change, refusal)
+                                 : ChangeValue(record, at, change, refusal);
+        if (!changed)
+            return false;
+        if (at.field->kind == FieldKind::KeyCode || at.field->kind == FieldKind::PadButton)
+            codes.push_back(at);
+    }
+    return CheckCodesStayApart(record, codes, refusal);
 }
 
 } // namespace
@@ -323,8 +365,7 @@ bool ReadAssignment(const std::string& argument, SettingChange* change)
     return true;
 }
 
-bool ChangesFromJson(const JsonValue& root, std::vector<SettingChange>* changes,
-                     std::string* refusal)
+bool ChangesFromJson(const Json& root, std::vector<SettingChange>* changes, std::string* refusal)
 {
     return Walk(root, "", changes, refusal);
 }
@@ -332,21 +373,12 @@ bool ChangesFromJson(const JsonValue& root, std::vector<SettingChange>* changes,
 bool ApplyChanges(config::CSaveConfig& record, const std::vector<SettingChange>& changes,
                   std::string* refusal)
 {
-    std::vector<config::FieldAt> codes;
-    for (const SettingChange& change : changes)
-    {
-        config::FieldAt at;
-        if (!config::FindField(change.name, &at, refusal))
-            return false;
-        const bool changed = config::IsListKind(at.field->kind)
-                                 ? ChangeList(record, *at.field, change, refusal)
-                                 : ChangeValue(record, at, change, refusal);
-        if (!changed)
-            return false;
-        if (at.field->kind == FieldKind::KeyCode || at.field->kind == FieldKind::PadButton)
-            codes.push_back(at);
-    }
-    return CheckCodesStayApart(record, codes, refusal);
+    // The record is changed in place; a refusal puts back its image.
+    const std::vector<std::uint8_t> before = record.SaveToBytes();
+    if (ApplyInOrder(record, changes, refusal))
+        return true;
+    record.LoadFromBytes(before.data(), before.size());
+    return false;
 }
 
 } // namespace cli

@@ -43,12 +43,11 @@ bool ReadAssignment(const std::string& argument, SettingChange* change);
 // (its "meaning" is only read past); a list replaces the whole list; an
 // array of settings sets its first elements. "file" and "version" at the
 // top are read past. False with the refusal (UTF-8).
-bool ChangesFromJson(const JsonValue& root, std::vector<SettingChange>* changes,
-                     std::string* refusal);
+bool ChangesFromJson(const Json& root, std::vector<SettingChange>* changes, std::string* refusal);
 
-// Makes the changes in order. False with the refusal (UTF-8), which names
-// the setting and the values it allows; the record is then changed in part,
-// so callers change a copy.
+// Makes the changes in order on the record itself. False with the refusal
+// (UTF-8), which names the setting and the values it allows; the record's
+// image is then put back as it was.
 bool ApplyChanges(config::CSaveConfig& record, const std::vector<SettingChange>& changes,
                   std::string* refusal);
 

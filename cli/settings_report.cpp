@@ -1,6 +1,7 @@
 #include "cli/settings_report.h"
 
 #include "cli/encoding.h"
+#include "cli/json.h"
 #include "config/field_table.h"
 #include "config/ip_address.h"
 
@@ -121,18 +122,13 @@ Setting Describe(const config::CSaveConfig& record, const config::FieldAt& at)
     return number;
 }
 
-// Control characters would break a line of the text form or a JSON string.
-void AppendEscaped(std::string& out, const std::string& text, bool json)
+// Control characters would break a line.
+void AppendEscaped(std::string& out, const std::string& text)
 {
     for (const char c : text)
     {
         const auto byte = static_cast<unsigned char>(c);
-        if (json && (c == '"' || c == '\\'))
-        {
-            out += '\\';
-            out += c;
-        }
-        else if (c == '\n')
+        if (c == '\n')
         {
             out += "\\n";
         }
@@ -143,7 +139,7 @@ void AppendEscaped(std::string& out, const std::string& text, bool json)
         else if (byte < 0x20 || byte == 0x7F)
         {
             char escape[8];
-            std::snprintf(escape, sizeof escape, json ? "\\u%04x" : "\\x%02x", byte);
+            std::snprintf(escape, sizeof escape, "\\x%02x", byte);
             out += escape;
         }
         else
@@ -153,12 +149,12 @@ void AppendEscaped(std::string& out, const std::string& text, bool json)
     }
 }
 
-std::string ValueText(const Setting& leaf, bool json)
+std::string ValueText(const Setting& leaf)
 {
     if (leaf.kind == Kind::Number)
         return std::to_string(leaf.number);
     std::string quoted = "\"";
-    AppendEscaped(quoted, leaf.text, json);
+    AppendEscaped(quoted, leaf.text);
     return quoted + "\"";
 }
 
@@ -166,11 +162,11 @@ void WriteText(std::string& out, const Setting& setting, const std::string& path
 {
     if (setting.kind == Kind::Number || setting.kind == Kind::Text)
     {
-        out += path + " = " + ValueText(setting, false);
+        out += path + " = " + ValueText(setting);
         if (!setting.meaning.empty())
         {
             out += " (";
-            AppendEscaped(out, setting.meaning, false);
+            AppendEscaped(out, setting.meaning);
             out += ")";
         }
         out += "\n";
@@ -193,45 +189,24 @@ void WriteText(std::string& out, const Setting& setting, const std::string& path
     }
 }
 
-std::string JsonString(const std::string& text)
+Json ToJson(const Setting& setting)
 {
-    std::string quoted = "\"";
-    AppendEscaped(quoted, text, true);
-    return quoted + "\"";
-}
-
-void WriteJson(std::string& out, const Setting& setting, int depth)
-{
-    const std::string indent(std::size_t(depth) * 2, ' ');
-    const std::string inner(std::size_t(depth + 1) * 2, ' ');
     if (setting.kind == Kind::Number || setting.kind == Kind::Text)
     {
+        Json value = setting.kind == Kind::Number ? Json(setting.number) : Json(setting.text);
         if (setting.meaning.empty())
-        {
-            out += ValueText(setting, true);
-            return;
-        }
-        out += "{\"value\": " + ValueText(setting, true) +
-               ", \"meaning\": " + JsonString(setting.meaning) + "}";
-        return;
+            return value;
+        return Json{{"value", std::move(value)}, {"meaning", setting.meaning}};
     }
-    const bool list = setting.kind == Kind::List;
-    if (setting.children.empty())
+    Json node = setting.kind == Kind::List ? Json::array() : Json::object();
+    for (const Setting& child : setting.children)
     {
-        out += list ? "[]" : "{}";
-        return;
+        if (setting.kind == Kind::List)
+            node.push_back(ToJson(child));
+        else
+            node[child.name] = ToJson(child);
     }
-    out += list ? "[\n" : "{\n";
-    for (std::size_t i = 0; i < setting.children.size(); ++i)
-    {
-        const Setting& child = setting.children[i];
-        out += inner;
-        if (!list)
-            out += JsonString(child.name) + ": ";
-        WriteJson(out, child, depth + 1);
-        out += i + 1 < setting.children.size() ? ",\n" : "\n";
-    }
-    out += indent + (list ? "]" : "}");
+    return node;
 }
 
 } // namespace
@@ -269,9 +244,7 @@ std::string SettingsText(const Setting& root)
 
 std::string SettingsJson(const Setting& root)
 {
-    std::string out;
-    WriteJson(out, root, 0);
-    return out + "\n";
+    return WriteJson(ToJson(root)) + "\n";
 }
 
 } // namespace cli

@@ -27,14 +27,24 @@ namespace cli
 namespace
 {
 
-void Print(const std::string& utf8)
-{
-    WriteConsoleText(stdout, utf8);
-}
-
 void Complain(const std::string& utf8)
 {
     WriteConsoleText(stderr, "vekcfg: " + utf8 + "\n");
+}
+
+// Output that cannot be written (a full disk, a closed pipe) is a failure,
+// never a success.
+int StandardOutputFailed(int error)
+{
+    Complain("cannot write to standard output: " +
+             Utf8FromNative(std::strerror(error != 0 ? error : EIO)));
+    return kExitTrouble;
+}
+
+int Print(const std::string& utf8, int status)
+{
+    errno = 0;
+    return WriteConsoleText(stdout, utf8) ? status : StandardOutputFailed(errno);
 }
 
 // The device every decode of music goes through; its failure is reported.
@@ -79,11 +89,9 @@ int Check(const Invocation& invocation)
     std::string out = run.message;
     if (invocation.details)
         out += DetailsText(run.result, run.figures);
-    Print(out);
-
-    const int status =
-        run.result == tension::MusicCheckResult::Accepted ? kExitSuccess : kExitCheckFailed;
-    if (invocation.svgPath.empty())
+    const int status = Print(
+        out, run.result == tension::MusicCheckResult::Accepted ? kExitSuccess : kExitCheckFailed);
+    if (invocation.svgPath.empty() || status == kExitTrouble)
         return status;
     if (!run.figures.hasTimeline)
     {
@@ -145,14 +153,19 @@ int CheckConfig(const Invocation& invocation)
         rows.push_back(std::move(check));
     }
     bool allPassed = true;
+    bool printed = true;
     CheckRows(rows, invocation.jobs > 0 ? invocation.jobs : DefaultJobs(),
-              [&allPassed](const RowCheck& checked)
+              [&allPassed, &printed](const RowCheck& checked)
               {
                   allPassed = allPassed && checked.result == tension::MusicCheckResult::Accepted;
-                  Print(ConfigRowLine(checked.row, Utf8FromCp932(checked.music),
-                                      Utf8FromCp932(checked.tension),
-                                      Utf8FromCp932(checked.message)));
+                  printed = printed &&
+                            WriteConsoleText(stdout, ConfigRowLine(checked.row,
+                                                                   Utf8FromCp932(checked.music),
+                                                                   Utf8FromCp932(checked.tension),
+                                                                   Utf8FromCp932(checked.message)));
               });
+    if (!printed)
+        return StandardOutputFailed(EIO);
     return allPassed ? kExitSuccess : kExitCheckFailed;
 }
 
@@ -164,13 +177,12 @@ int Show(const Invocation& invocation)
     if (!LoadSettings(invocation, record, &path, &version))
         return kExitTrouble;
     const Setting settings = DescribeSettings(record, path, version);
-    Print(invocation.json ? SettingsJson(settings) : SettingsText(settings));
-    return kExitSuccess;
+    return Print(invocation.json ? SettingsJson(settings) : SettingsText(settings), kExitSuccess);
 }
 
-// Every change is made on a copy of the record, so that a refusal leaves
-// the file as it was; the save is the tool's own, which replaces the file
-// in one step or not at all.
+// Only a file that is a settings file as this tool writes it is changed;
+// every value is checked before the save, which is the tool's own: it
+// replaces the file in one step or not at all.
 int ChangeSettings(const Invocation& invocation, const std::vector<SettingChange>& given)
 {
     config::CSaveConfig record;
@@ -178,18 +190,17 @@ int ChangeSettings(const Invocation& invocation, const std::vector<SettingChange
     std::uint32_t version = 0;
     if (!LoadSettings(invocation, record, &path, &version))
         return kExitTrouble;
-    config::CSaveConfig changed(record);
     std::string refusal;
-    if (!ApplyChanges(changed, given, &refusal))
+    if (!ApplyChanges(record, given, &refusal))
     {
         Complain(refusal);
         return kExitTrouble;
     }
-    if (!changed.SaveToPath(path.c_str()))
+    if (!record.SaveToPath(path.c_str()))
     {
         Complain("cannot save the settings file \"" + Utf8FromNative(path) +
                  "\"; it is left as it was");
-        return kExitCheckFailed;
+        return kExitTrouble;
     }
     return kExitSuccess;
 }
@@ -200,18 +211,10 @@ int Set(const Invocation& invocation)
     for (const std::string& assignment : invocation.assignments)
     {
         SettingChange change;
-        ReadAssignment(Utf8FromNative(assignment), &change);
+        ReadAssignment(assignment, &change);
         changes.push_back(std::move(change));
     }
     return ChangeSettings(invocation, changes);
-}
-
-bool ReadAll(std::FILE* file, std::string* bytes)
-{
-    char chunk[4096];
-    for (std::size_t got; (got = std::fread(chunk, 1, sizeof chunk, file)) != 0;)
-        bytes->append(chunk, got);
-    return std::ferror(file) == 0;
 }
 
 int Apply(const Invocation& invocation)
@@ -220,24 +223,31 @@ int Apply(const Invocation& invocation)
     const bool standardInput = invocation.jsonPath == "-";
     errno = 0;
     std::FILE* file = standardInput ? stdin : std::fopen(invocation.jsonPath.c_str(), "rb");
-    const bool read = file != nullptr && ReadAll(file, &bytes);
+    bool tooLarge = false;
+    const bool read = file != nullptr && ReadBounded(file, kMaxJsonBytes, &bytes, &tooLarge);
     const int readError = errno;
     if (file != nullptr && !standardInput)
         std::fclose(file);
     const std::string shown = standardInput
                                   ? std::string("standard input")
                                   : std::string("\"") + Utf8FromNative(invocation.jsonPath) + "\"";
+    if (tooLarge)
+    {
+        Complain("the settings tree " + shown + " is larger than " +
+                 std::to_string(kMaxJsonBytes >> 20) + " MiB, more than any settings file holds");
+        return kExitTrouble;
+    }
     if (!read)
     {
         Complain("cannot read the settings tree " + shown + ": " +
                  Utf8FromNative(std::strerror(readError != 0 ? readError : EIO)));
         return kExitTrouble;
     }
-    JsonValue tree;
+    Json tree;
     std::string error;
-    if (!ReadJson(Utf8FromInput(bytes), &tree, &error))
+    if (!ReadJson(bytes, &tree, &error))
     {
-        Complain("the settings tree " + shown + " is not JSON: " + error);
+        Complain("the settings tree " + shown + " is refused: " + error);
         return kExitTrouble;
     }
     std::vector<SettingChange> changes;
@@ -290,9 +300,11 @@ int Draft(const Invocation& invocation)
     }
     if (invocation.outputPath.empty())
     {
-        std::fwrite(text.data(), 1, text.size(), stdout);
-        std::fflush(stdout);
-        return kExitSuccess;
+        errno = 0;
+        const bool written = std::fwrite(text.data(), 1, text.size(), stdout) == text.size();
+        if (std::fflush(stdout) == 0 && written)
+            return kExitSuccess;
+        return StandardOutputFailed(errno);
     }
     if (!base::WriteFileAtomically(invocation.outputPath.c_str(), text.data(), text.size()))
     {
@@ -310,15 +322,23 @@ int RunVekcfg(int argc, const char* const* argv)
         ParseCommandLine(std::vector<std::string>(argv, argv + (argc > 0 ? argc : 0)));
     if (!parsed.valid)
         return UsageError(parsed.error);
-    const Invocation& invocation = parsed.invocation;
+    Invocation invocation = parsed.invocation;
+    // Paths are opened as the system's functions take them.
+    for (std::string* path :
+         {&invocation.musicPath, &invocation.tensionPath, &invocation.svgPath,
+          &invocation.settingsPath, &invocation.jsonPath, &invocation.outputPath})
+    {
+        const std::string given = *path;
+        if (!NativeFromUtf8(given, path))
+            return UsageError("the path \"" + given +
+                              "\" has a character the system's code page has no form for");
+    }
     switch (invocation.command)
     {
     case Command::Help:
-        Print(HelpText());
-        return kExitSuccess;
+        return Print(HelpText(), kExitSuccess);
     case Command::Version:
-        Print("vekcfg " + std::string(kVersion) + "\n");
-        return kExitSuccess;
+        return Print("vekcfg " + std::string(kVersion) + "\n", kExitSuccess);
     case Command::Check:
         return Check(invocation);
     case Command::CheckConfig:

@@ -3,9 +3,9 @@
 namespace cli
 {
 
-// The whole of vekcfg: reads the arguments (without the program's name),
-// prints to stdout and stderr and returns the exit status: 0 success, 1 a
-// check failed, 2 a usage error or a file that could not be read or written.
+// The whole of vekcfg: reads the arguments (without the program's name, in
+// UTF-8), prints to stdout and stderr and returns the exit status: 0 done,
+// 1 a check failed, 2 refused or not written.
 int RunVekcfg(int argc, const char* const* argv);
 
 inline constexpr int kExitSuccess = 0;

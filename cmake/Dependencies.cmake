@@ -46,3 +46,18 @@ else()
   add_library(vek_ebur128 INTERFACE)
   target_link_libraries(vek_ebur128 INTERFACE PkgConfig::EBUR128)
 endif()
+
+# nlohmann-json (header-only): Debian's natively; for the MinGW cross build a
+# copy of those headers in a folder of their own (tools/setup-deps puts it in
+# .deps/json), so the host's include folder never reaches the cross
+# compiler; on Windows itself, the toolchain's own package.
+add_library(vek_json INTERFACE)
+if(WIN32)
+  set(VEK_JSON_INCLUDE ${PROJECT_SOURCE_DIR}/.deps/json/include CACHE PATH "Folder holding nlohmann/json.hpp")
+  if(EXISTS ${VEK_JSON_INCLUDE}/nlohmann/json.hpp)
+    target_include_directories(vek_json SYSTEM INTERFACE ${VEK_JSON_INCLUDE})
+  endif()
+else()
+  find_package(nlohmann_json 3.11 REQUIRED)
+  target_link_libraries(vek_json INTERFACE nlohmann_json::nlohmann_json)
+endif()

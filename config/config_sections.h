@@ -4,6 +4,8 @@
 // section's payload in the file, padding included; the game reads the same
 // bytes, so every size and offset is pinned below.
 
+#include "base/input_codes.h"
+
 #include <cstddef>
 #include <cstdint>
 
@@ -15,7 +17,7 @@ inline constexpr int kConnectSlotCount = 24;
 inline constexpr int kReplayCount = 30;
 inline constexpr int kUserBgmRowCount = 10;
 inline constexpr int kPathCapacity = 260;
-inline constexpr int kActionCount = 24;
+inline constexpr int kActionCount = input::kActionCount;
 inline constexpr int kPlayerCount = 4;
 inline constexpr int kRadioChatCount = 12;
 inline constexpr int kRadioChatTextCapacity = 40;

@@ -1,11 +1,10 @@
 #include "config/field_table.h"
 
 #include "base/cp932.h"
+#include "base/input_codes.h"
 #include "config/fixed_text.h"
 #include "config/ip_address.h"
 #include "config/volume.h"
-#include "input/name_tables.h"
-#include "input/pad_frame.h"
 
 #include <charconv>
 #include <cstdio>
@@ -22,9 +21,6 @@ constexpr std::int64_t kDefaultKeyboardKeys[kActionCount] = {
 };
 
 constexpr std::int64_t kLowestSliderVolume = kSliderMinimumVolume + 1;
-constexpr std::int64_t kHighestKeyCode = 255;
-constexpr std::int64_t kHighestController = 255;
-constexpr std::int64_t kHighestPort = 65535;
 constexpr std::size_t kOctetCount = 4;
 
 constexpr FieldDescription Field(const char* name, FieldKind kind, Section section,
@@ -42,7 +38,8 @@ constexpr FieldDescription Field(const char* name, FieldKind kind, Section secti
             0,
             FieldLabel::None,
             DefaultRule::Constant,
-            defaultValue};
+            defaultValue,
+            ~std::uint32_t(0)};
 }
 
 constexpr FieldDescription TextField(const char* name, Section section, std::size_t offset,
@@ -70,6 +67,16 @@ using M = ConfigGame;
 using N = ConfigNetwork;
 using K = ConfigKeys;
 using FK = FieldKind;
+
+// The controller page never assigns a stick direction: neither a capture
+// nor an exchange moves the codes of actions 4 to 7 and 9 to 12.
+constexpr std::uint32_t kStickDirectionActions = 0xF0 | 0x1E00;
+
+constexpr FieldDescription Offering(FieldDescription field, std::uint32_t offered)
+{
+    field.offered = offered;
+    return field;
+}
 
 constexpr std::size_t kButtonsOffset = offsetof(K, padConfigs) + offsetof(PadConfig, buttons);
 constexpr std::size_t kDeviceOffset = offsetof(K, padConfigs) + offsetof(PadConfig, device);
@@ -134,10 +141,11 @@ const FieldDescription kFields[] = {
     Indexed(
         Field("keys.keyboardKeys[]", FK::KeyCode, Section::Keys, offsetof(K, keyboardKeys), 4, 0),
         kActionCount, 4, FieldLabel::Action, DefaultRule::KeyboardTable),
-    Indexed(Indexed(Field("keys.padConfigs[].buttons[]", FK::PadButton, Section::Keys,
-                          kButtonsOffset, 4, 0),
-                    kPlayerCount, sizeof(PadConfig), FieldLabel::None),
-            kActionCount, 4, FieldLabel::Action, DefaultRule::LastIndex),
+    Offering(Indexed(Indexed(Field("keys.padConfigs[].buttons[]", FK::PadButton, Section::Keys,
+                                   kButtonsOffset, 4, 0),
+                             kPlayerCount, sizeof(PadConfig), FieldLabel::None),
+                     kActionCount, 4, FieldLabel::Action, DefaultRule::LastIndex),
+             ~kStickDirectionActions),
     Indexed(Field("keys.padConfigs[].device", FK::Controller, Section::Keys, kDeviceOffset, 1, 0),
             kPlayerCount, sizeof(PadConfig), FieldLabel::Player, DefaultRule::LastIndex),
 
@@ -212,11 +220,6 @@ std::string Label(const FieldAt& at)
 std::string Labelled(const FieldAt& at, const std::string& rest)
 {
     return Label(at) + ": " + rest;
-}
-
-std::string CodeName(const char* name)
-{
-    return *name != '\0' ? std::string(name) : std::string("(no name)");
 }
 
 bool ReadInteger(std::string_view text, std::int64_t* value)
@@ -294,47 +297,186 @@ std::vector<std::string> MeaningForms(const FieldAt& at, std::int64_t value)
     return forms;
 }
 
-// The values whose meanings a text is compared with.
+constexpr const char* kSwitchNames[] = {"off", "on"};
+constexpr const char* kLockNames[] = {"unlocked", "locked"};
+constexpr const char* kRecipientNames[] = {"to everyone (全体 checked)",
+                                           "not to everyone (全体 cleared)"};
+
+std::string VolumeName(std::int64_t value)
+{
+    if (value == kSilentVolume)
+        return "silent";
+    char decibels[32];
+    std::snprintf(decibels, sizeof decibels, "%.2f dB", static_cast<double>(value) / 100.0);
+    return decibels;
+}
+
+std::string ControllerName(std::int64_t value)
+{
+    return "game controller " + Decimal(value) + " in enumeration order";
+}
+
+// Only the low byte of a stored code names it, as on the key pages.
+std::string KeyCodeName(std::int64_t value)
+{
+    return input::KeyName(static_cast<std::uint8_t>(value));
+}
+
+std::string PadButtonCodeName(std::int64_t value)
+{
+    return input::PadButtonName(static_cast<std::uint8_t>(value));
+}
+
+bool IsVolumeLevel(std::int64_t value)
+{
+    return value == kSilentVolume || value >= kLowestSliderVolume;
+}
+
+bool IsFreeKey(std::int64_t value)
+{
+    return !input::IsReservedKey(static_cast<int>(value));
+}
+
+// Highest of a choice: its last option.
+constexpr std::int64_t kLastOption = -1;
+
+// What one kind of field stores and what its values mean: the range the
+// controls allow, the names of the values, and the allowed values in words.
+struct KindRules
+{
+    FieldKind kind;
+    std::int64_t lowest;
+    std::int64_t highest;
+    // Values inside the range the controls never store; null: none.
+    bool (*allows)(std::int64_t);
+    // The names of the values from 0 (a choice's are its options); a flag's
+    // second name stands for any value but 0.
+    std::span<const char* const> names;
+    bool flag;
+    // Names made from the value; empty where it has none.
+    std::string (*name)(std::int64_t);
+    // Whether a meaning begins with the label of the field's last index.
+    bool labelled;
+    // Null: the range, then the names.
+    const char* allowed;
+};
+
+constexpr KindRules kKindRules[] = {
+    {FK::Choice, 0, kLastOption, nullptr, {}, false, nullptr, false, nullptr},
+    {FK::Switch, 0, 1, nullptr, kSwitchNames, true, nullptr, false, nullptr},
+    {FK::Lock, 0, 1, nullptr, kLockNames, true, nullptr, true, nullptr},
+    {FK::Recipient, 0, 1, nullptr, kRecipientNames, true, nullptr, true, nullptr},
+    {FK::Volume,
+     kSilentVolume,
+     0,
+     IsVolumeLevel,
+     {},
+     false,
+     VolumeName,
+     false,
+     "-2999 to 0 (hundredths of a decibel), or -10000 for silence; or the meaning, such as "
+     "-12.50 dB or silent"},
+    {FK::Port, 0, 65535, nullptr, {}, false, nullptr, false, nullptr},
+    {FK::Controller,
+     0,
+     255,
+     nullptr,
+     {},
+     false,
+     ControllerName,
+     true,
+     "0 to 255, the controller's number in enumeration order"},
+    {FK::KeyCode,
+     1,
+     255,
+     IsFreeKey,
+     {},
+     false,
+     KeyCodeName,
+     true,
+     "a key name such as UP, Z or 2 (also DIK_UP), or a key code 1 to 255; never ESCAPE or F1 to "
+     "F12"},
+    {FK::PadButton,
+     0,
+     input::kPadFrameSize - 1,
+     nullptr,
+     {},
+     false,
+     PadButtonCodeName,
+     true,
+     "a button name such as BUTTON3 or DP_UP, or a code 0 to 47"},
+    {FK::Text, 1, 0, nullptr, {}, false, nullptr, false, nullptr},
+    {FK::ConnectList,
+     1,
+     0,
+     nullptr,
+     {},
+     false,
+     nullptr,
+     false,
+     "NAME+=ADDRESS or NAME-=ADDRESS, at most 24 addresses; an address is four octets, each 0 "
+     "to 255 or *, such as 192.168.1.*"},
+    {FK::AllowList,
+     1,
+     0,
+     nullptr,
+     {},
+     false,
+     nullptr,
+     false,
+     "NAME+=ADDRESS or NAME-=ADDRESS; an address is four octets, each 0 to 255 or *, such as "
+     "192.168.1.*"},
+    {FK::DenyList,
+     1,
+     0,
+     nullptr,
+     {},
+     false,
+     nullptr,
+     false,
+     "NAME+=ADDRESS or NAME-=ADDRESS; an address is four octets, each 0 to 255 or *, such as "
+     "192.168.1.*"},
+};
+
+constexpr bool InKindOrder()
+{
+    for (std::size_t i = 0; i < std::size(kKindRules); ++i)
+    {
+        if (static_cast<std::size_t>(kKindRules[i].kind) != i)
+            return false;
+    }
+    return true;
+}
+static_assert(InKindOrder(), "one row per kind, in the order of FieldKind");
+
+const KindRules& RulesOf(FieldKind kind)
+{
+    return kKindRules[static_cast<std::size_t>(kind)];
+}
+
+std::span<const char* const> NamesOf(const FieldDescription& field, const KindRules& rules)
+{
+    return rules.highest == kLastOption ? field.options : rules.names;
+}
+
+std::int64_t Highest(const FieldDescription& field, const KindRules& rules)
+{
+    return rules.highest == kLastOption ? static_cast<std::int64_t>(field.options.size()) - 1
+                                        : rules.highest;
+}
+
+// The values whose meanings a text is compared with: every allowed value
+// that has a name.
 std::vector<std::int64_t> NamedValues(const FieldDescription& field)
 {
+    const KindRules& rules = RulesOf(field.kind);
     std::vector<std::int64_t> values;
-    switch (field.kind)
+    if (rules.name == nullptr && NamesOf(field, rules).empty())
+        return values;
+    for (std::int64_t v = rules.lowest; v <= Highest(field, rules); ++v)
     {
-    case FieldKind::Choice:
-        for (std::size_t i = 0; i < field.options.size(); ++i)
-            values.push_back(static_cast<std::int64_t>(i));
-        break;
-    case FieldKind::Switch:
-    case FieldKind::Lock:
-    case FieldKind::Recipient:
-        values = {0, 1};
-        break;
-    case FieldKind::Volume:
-        values.push_back(kSilentVolume);
-        for (std::int64_t v = kLowestSliderVolume; v <= 0; ++v)
+        if (IsAllowed(field, v) && (rules.name == nullptr || !rules.name(v).empty()))
             values.push_back(v);
-        break;
-    case FieldKind::Controller:
-        for (std::int64_t v = 0; v <= kHighestController; ++v)
-            values.push_back(v);
-        break;
-    case FieldKind::KeyCode:
-        for (std::int64_t v = 1; v <= kHighestKeyCode; ++v)
-        {
-            if (IsAllowed(field, v) && *input::KeyName(static_cast<std::uint8_t>(v)) != '\0')
-                values.push_back(v);
-        }
-        break;
-    case FieldKind::PadButton:
-        for (std::int64_t v = 0; v < input::kPadFrameSize; ++v)
-            values.push_back(v);
-        break;
-    case FieldKind::Port:
-    case FieldKind::Text:
-    case FieldKind::ConnectList:
-    case FieldKind::AllowList:
-    case FieldKind::DenyList:
-        break;
     }
     return values;
 }
@@ -357,6 +499,13 @@ std::span<const FieldDescription> Fields()
 int IndexCount(const FieldDescription& field)
 {
     return field.counts[0] == 0 ? 0 : field.counts[1] == 0 ? 1 : 2;
+}
+
+bool IsOffered(const FieldAt& at)
+{
+    const int indices = IndexCount(*at.field);
+    const int last = indices == 0 ? 0 : at.index[indices - 1];
+    return (at.field->offered >> last & 1) != 0;
 }
 
 bool IsListKind(FieldKind kind)
@@ -505,7 +654,11 @@ std::string FieldName(const FieldAt& at)
     {
         if (c[0] == '[' && c[1] == ']')
         {
-            name += std::string("[") + Decimal(at.index[dimension++]) + "]";
+            // Appended piece by piece: GCC 12 warns of an overlap that is not
+            // there in the optimised concatenation of three strings.
+            name += '[';
+            name += Decimal(at.index[dimension++]);
+            name += ']';
             ++c;
         }
         else
@@ -581,42 +734,27 @@ bool FitsText(const FieldDescription& field, std::string_view text)
 
 std::string ValueMeaning(const FieldAt& at, std::int64_t value)
 {
-    switch (at.field->kind)
+    const KindRules& rules = RulesOf(at.field->kind);
+    const std::span<const char* const> names = NamesOf(*at.field, rules);
+    std::string meaning;
+    if (rules.name != nullptr)
     {
-    case FieldKind::Choice:
-        return value >= 0 && value < static_cast<std::int64_t>(at.field->options.size())
-                   ? std::string(at.field->options[static_cast<std::size_t>(value)])
-                   : std::string("no such choice");
-    case FieldKind::Switch:
-        return value != 0 ? "on" : "off";
-    case FieldKind::Lock:
-        return Labelled(at, value != 0 ? "locked" : "unlocked");
-    case FieldKind::Recipient:
-        return Labelled(at, value == 0 ? "to everyone (全体 checked)"
-                                       : "not to everyone (全体 cleared)");
-    case FieldKind::Volume:
+        meaning = rules.name(value);
+        if (meaning.empty())
+            meaning = "(no name)";
+    }
+    else if (!names.empty())
     {
-        if (value == kSilentVolume)
-            return "silent";
-        char decibels[32];
-        std::snprintf(decibels, sizeof decibels, "%.2f dB", static_cast<double>(value) / 100.0);
-        return decibels;
+        const std::int64_t index = rules.flag ? value != 0 : value;
+        meaning = index >= 0 && index < static_cast<std::int64_t>(names.size())
+                      ? std::string(names[static_cast<std::size_t>(index)])
+                      : std::string("no such choice");
     }
-    case FieldKind::Controller:
-        return Labelled(at, "game controller " + Decimal(value) + " in enumeration order");
-    case FieldKind::KeyCode:
-        // Only the low byte of a stored code names it, as on the key pages.
-        return Labelled(at, CodeName(input::KeyName(static_cast<std::uint8_t>(value))));
-    case FieldKind::PadButton:
-        return Labelled(at, CodeName(input::PadButtonName(static_cast<std::uint8_t>(value))));
-    case FieldKind::Port:
-    case FieldKind::Text:
-    case FieldKind::ConnectList:
-    case FieldKind::AllowList:
-    case FieldKind::DenyList:
-        break;
+    else
+    {
+        return meaning;
     }
-    return std::string();
+    return rules.labelled ? Labelled(at, meaning) : meaning;
 }
 
 std::string TextMeaning(const FieldAt& at)
@@ -626,75 +764,22 @@ std::string TextMeaning(const FieldAt& at)
 
 bool IsAllowed(const FieldDescription& field, std::int64_t value)
 {
-    switch (field.kind)
-    {
-    case FieldKind::Choice:
-        return value >= 0 && value < static_cast<std::int64_t>(field.options.size());
-    case FieldKind::Switch:
-    case FieldKind::Lock:
-    case FieldKind::Recipient:
-        return value == 0 || value == 1;
-    case FieldKind::Volume:
-        return value == kSilentVolume || (value >= kLowestSliderVolume && value <= 0);
-    case FieldKind::Port:
-        return value >= 0 && value <= kHighestPort;
-    case FieldKind::Controller:
-        return value >= 0 && value <= kHighestController;
-    case FieldKind::KeyCode:
-        return value >= 1 && value <= kHighestKeyCode &&
-               !input::IsReservedKey(static_cast<int>(value));
-    case FieldKind::PadButton:
-        return value >= 0 && value < input::kPadFrameSize;
-    case FieldKind::Text:
-    case FieldKind::ConnectList:
-    case FieldKind::AllowList:
-    case FieldKind::DenyList:
-        break;
-    }
-    return false;
+    const KindRules& rules = RulesOf(field.kind);
+    return IsNumberKind(field.kind) && value >= rules.lowest && value <= Highest(field, rules) &&
+           (rules.allows == nullptr || rules.allows(value));
 }
 
 std::string AllowedValues(const FieldDescription& field)
 {
-    switch (field.kind)
-    {
-    case FieldKind::Choice:
-        return "0 to " + Decimal(static_cast<std::int64_t>(field.options.size()) - 1) +
-               ", or one of " + ChoiceList(field.options);
-    case FieldKind::Switch:
-        return "0 or 1, or off or on";
-    case FieldKind::Lock:
-        return "0 or 1, or unlocked or locked";
-    case FieldKind::Recipient:
-        return "0 or 1, or \"to everyone\" (全体 checked) or \"not to everyone\" (全体 cleared)";
-    case FieldKind::Volume:
-        return Decimal(kLowestSliderVolume) + " to 0 (hundredths of a decibel), or " +
-               Decimal(kSilentVolume) +
-               " for silence; or the meaning, such as -12.50 dB or "
-               "silent";
-    case FieldKind::Port:
-        return "0 to " + Decimal(kHighestPort);
-    case FieldKind::Controller:
-        return "0 to " + Decimal(kHighestController) +
-               ", the controller's number in enumeration order";
-    case FieldKind::KeyCode:
-        return "a key name such as UP, Z or 2 (also DIK_UP), or a key code 1 to 255; never "
-               "ESCAPE or F1 to F12";
-    case FieldKind::PadButton:
-        return "a button name such as BUTTON3 or DP_UP, or a code 0 to " +
-               Decimal(input::kPadFrameSize - 1);
-    case FieldKind::Text:
+    const KindRules& rules = RulesOf(field.kind);
+    if (field.kind == FieldKind::Text)
         return "a text of at most " + Decimal(static_cast<std::int64_t>(field.textLimit)) +
                " bytes in code page 932";
-    case FieldKind::ConnectList:
-        return "NAME+=ADDRESS or NAME-=ADDRESS, at most " + Decimal(kConnectSlotCount) +
-               " addresses; an address is four octets, each 0 to 255 or *, such as 192.168.1.*";
-    case FieldKind::AllowList:
-    case FieldKind::DenyList:
-        return "NAME+=ADDRESS or NAME-=ADDRESS; an address is four octets, each 0 to 255 or *, "
-               "such as 192.168.1.*";
-    }
-    return std::string();
+    if (rules.allowed != nullptr)
+        return rules.allowed;
+    const std::span<const char* const> names = NamesOf(field, rules);
+    return Decimal(rules.lowest) + " to " + Decimal(Highest(field, rules)) +
+           (names.empty() ? "" : ", or one of " + ChoiceList(names));
 }
 
 bool ParseValue(const FieldAt& at, std::string_view text, std::int64_t* value)

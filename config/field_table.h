@@ -143,6 +143,9 @@ struct FieldDescription
     FieldLabel label;
     DefaultRule defaultRule;
     std::int64_t defaultValue;
+    // The values of the last index a page changes, one bit each; the others
+    // keep what they hold.
+    std::uint32_t offered;
 };
 
 std::span<const FieldDescription> Fields();
@@ -168,6 +171,8 @@ bool FindField(std::string_view name, FieldAt* at, std::string* reason);
 bool IsFieldGroup(std::string_view name);
 std::string FieldName(const FieldAt& at);
 int IndexCount(const FieldDescription& field);
+// Whether a page changes this element.
+bool IsOffered(const FieldAt& at);
 
 bool IsListKind(FieldKind kind);
 bool IsNumberKind(FieldKind kind);

@@ -151,7 +151,74 @@ void AppendList(std::vector<std::uint8_t>& image, const IpEntry* list, std::uint
     image.insert(image.end(), bytes, bytes + count * kEntrySize);
 }
 
+std::uint32_t WordAt(const std::uint8_t* data, std::size_t offset)
+{
+    std::uint32_t word;
+    std::memcpy(&word, data + offset, sizeof word);
+    return word;
+}
+
 } // namespace
+
+ImageCheck CheckWrittenImage(const std::uint8_t* data, std::size_t size)
+{
+    ImageCheck check;
+    if (size < sizeof(std::uint32_t))
+    {
+        check.fault = ImageFault::ShorterThanVersion;
+        return check;
+    }
+    check.version = WordAt(data, 0);
+    if (check.version != kFileVersion)
+    {
+        check.fault =
+            check.version > kFileVersion ? ImageFault::NewerVersion : ImageFault::OtherVersion;
+        return check;
+    }
+    const struct
+    {
+        const char* name;
+        std::uint32_t length;
+        bool listsFollow;
+    } sections[] = {
+        {"graphics", sizeof(ConfigGraphics), false},   {"game", sizeof(ConfigGame), false},
+        {"network", sizeof(ConfigNetwork), true},      {"replay", sizeof(ConfigReplay), false},
+        {"userBgm", sizeof(ConfigUserBgm), false},     {"keys", sizeof(ConfigKeys), false},
+        {"radioChat", sizeof(ConfigRadioChat), false},
+    };
+    std::uint64_t position = sizeof(std::uint32_t);
+    for (const auto& section : sections)
+    {
+        if (position + sizeof(std::uint32_t) > size)
+        {
+            check.fault = ImageFault::SizeMismatch;
+            return check;
+        }
+        const std::uint32_t stored = WordAt(data, position);
+        if (stored != section.length)
+        {
+            check.fault = ImageFault::SectionLength;
+            check.section = section.name;
+            check.storedLength = stored;
+            check.length = section.length;
+            return check;
+        }
+        position += sizeof stored + stored;
+        if (section.listsFollow && position <= size)
+        {
+            const std::size_t counts =
+                position - sizeof(ConfigNetwork) + offsetof(ConfigNetwork, allowCount);
+            position +=
+                (std::uint64_t(WordAt(data, counts)) + WordAt(data, counts + 4)) * kEntrySize;
+        }
+    }
+    if (position != size)
+    {
+        check.fault = ImageFault::SizeMismatch;
+        check.expectedSize = position;
+    }
+    return check;
+}
 
 bool IsConnectSlotEmpty(const IpEntry& entry)
 {

@@ -27,6 +27,35 @@ bool BuildSaveDirectory(char* buffer, const char* folder, std::size_t size);
 // The settings file's full path, built as the tool builds it.
 bool BuildSaveFilePath(char* buffer, std::size_t size);
 
+// Why an image is not a settings file exactly as this tool writes one.
+enum class ImageFault
+{
+    None,
+    ShorterThanVersion,
+    NewerVersion,
+    OtherVersion,
+    SectionLength,
+    SizeMismatch,
+};
+
+struct ImageCheck
+{
+    ImageFault fault = ImageFault::None;
+    std::uint32_t version = 0;
+    // SectionLength: which section, its stored length and ours.
+    const char* section = nullptr;
+    std::uint32_t storedLength = 0;
+    std::uint32_t length = 0;
+    // SizeMismatch: the size its sections and list counts make (0 when the
+    // image ends before its list counts).
+    std::uint64_t expectedSize = 0;
+};
+
+// Whether an image is a settings file of the current version with the
+// section lengths it writes and the size they and its list counts make:
+// the only kind of file vekcfg rewrites.
+ImageCheck CheckWrittenImage(const std::uint8_t* data, std::size_t size);
+
 // Every setting the tool edits: the image of "GameConfig.dat".
 class CSaveConfig : public base::CAllocated
 {

@@ -31,8 +31,9 @@ LRESULT CConfigApplication::OnKeyboardPage(HWND, UINT message, WPARAM wParam, LP
 void CConfigApplication::CaptureKey()
 {
     config::ConfigKeys& keys = *record_->Keys();
-    const input::Capture capture = input::DecideKeyCapture(keys, focusedAction_, *input_);
-    input::ApplyKeyCapture(capture, keys, focusedAction_);
+    const input::Capture capture =
+        input::DecideKeyCapture(keys.keyboardKeys, focusedAction_, *input_);
+    input::ApplyKeyCapture(capture, keys.keyboardKeys, focusedAction_);
     dialog::ShowCapture(keyPages_[kKeyboardPageIndex].window, IDC_KEYBOARD_EDIT_FIRST, capture,
                         input::CDirectInput::GetKeyName);
 }

@@ -14,7 +14,7 @@ void CConfigApplication::FillPadPage()
     const config::PadConfig& player = record_->Keys()->padConfigs[selectedPlayer_];
     dialog::ShowActions(page, IDC_PAD_LABEL_FIRST, IDC_PAD_EDIT_FIRST, player.buttons,
                         input::CDirectInput::GetPadButtonName);
-    input::BindPlayerToSlot(player, input_->GetSlot(0));
+    input::BindPlayerToSlot(player.buttons, player.device, input_->GetSlot(0));
 
     const HWND devices = GetDlgItem(page, IDC_PAD_DEVICE);
     SendMessageW(devices, CB_RESETCONTENT, 0, 0);
@@ -71,8 +71,8 @@ LRESULT CConfigApplication::OnPadPage(HWND page, UINT message, WPARAM wParam, LP
 void CConfigApplication::CapturePadButton()
 {
     config::PadConfig& player = record_->Keys()->padConfigs[selectedPlayer_];
-    const input::Capture capture = input::DecidePadCapture(player, focusedAction_, *input_);
-    input::ApplyPadCapture(capture, player, input_->GetSlot(0), focusedAction_);
+    const input::Capture capture = input::DecidePadCapture(player.buttons, focusedAction_, *input_);
+    input::ApplyPadCapture(capture, player.buttons, input_->GetSlot(0), focusedAction_);
     dialog::ShowCapture(keyPages_[kPadPageIndex].window, IDC_PAD_EDIT_FIRST, capture,
                         input::CDirectInput::GetPadButtonName);
 }

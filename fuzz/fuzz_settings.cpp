@@ -15,20 +15,18 @@ namespace
 {
 
 // A record that is not all defaults, so that a change by a refused load shows.
-config::CSaveConfig MakePrevious()
-{
-    config::CSaveConfig record;
-    record.ResetAll();
-    const config::IpEntry entry{{"192", "168", "000", "*"}};
-    record.AddAllowEntry(entry);
-    record.AddDenyEntry(entry);
-    record.Graphics()->screenSize = 7;
-    return record;
-}
-
 const config::CSaveConfig& Previous()
 {
-    static const config::CSaveConfig record = MakePrevious();
+    static const config::CSaveConfig record = []
+    {
+        config::CSaveConfig made;
+        made.ResetAll();
+        const config::IpEntry entry{{"192", "168", "000", "*"}};
+        made.AddAllowEntry(entry);
+        made.AddDenyEntry(entry);
+        made.Graphics()->screenSize = 7;
+        return made;
+    }();
     return record;
 }
 

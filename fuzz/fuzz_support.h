@@ -6,7 +6,7 @@
 #include <cstdio>
 #include <cstdlib>
 
-// The fuzz build compiles through fuzz/clang-cp932: literals must be the code
+// The fuzz build compiles through tools/clang-cp932: literals must be the code
 // page 932 bytes of the product, or the Japanese keys would never match.
 static_assert(sizeof("表") == 3 && "表"[0] == '\x95' && "表"[1] == '\x5C');
 

@@ -1,6 +1,6 @@
 #include "input/direct_input.h"
 
-#include "input/name_tables.h"
+#include "base/input_codes.h"
 
 namespace input
 {
@@ -13,6 +13,11 @@ CDirectInput::CDirectInput()
     : directInput(nullptr), keyboard(nullptr), mouse(nullptr), joysticks{}, joystickCount(0),
       keyPrevious{}, keyCurrent{}, mouseState{}, joyPrevious{}, joyCurrent{}, joyInfo{}, system{}
 {
+    for (int i = 0; i < kMaxJoysticks; ++i)
+    {
+        ReleaseJoystickState(joyPrevious[i]);
+        ReleaseJoystickState(joyCurrent[i]);
+    }
 }
 
 CDirectInput::~CDirectInput()
@@ -62,6 +67,13 @@ const char* CDirectInput::GetKeyName(std::uint8_t code)
 const char* CDirectInput::GetPadButtonName(std::uint8_t code)
 {
     return PadButtonName(code);
+}
+
+void ReleaseJoystickState(DIJOYSTATE2& state)
+{
+    state = DIJOYSTATE2{};
+    for (auto& pov : state.rgdwPOV)
+        pov = 0xFFFFFFFF;
 }
 
 void KeepPressedBits(std::uint8_t* bytes, int count)

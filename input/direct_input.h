@@ -77,6 +77,11 @@ protected:
     InputWindow system;
 };
 
+// What a controller reads as while it cannot be read (before its first
+// read, and while the window is in the background): nothing pressed, the
+// axes at rest and every POV centred, so that no d-pad direction shows.
+void ReleaseJoystickState(DIJOYSTATE2& state);
+
 // The devices report bytes with bit 7 set for a pressed key or button; the
 // layer keeps 0 or 1.
 void KeepPressedBits(std::uint8_t* bytes, int count);

@@ -49,7 +49,10 @@ void CDirectInput::PollJoysticks()
             continue;
         joyPrevious[i] = joyCurrent[i];
         if (!Devices().foreground)
+        {
+            ReleaseJoystickState(joyCurrent[i]);
             continue;
+        }
         joyCurrent[i] = Devices().joysticks[joysticks[i]->joystick].state;
         KeepPressedBits(joyCurrent[i].rgbButtons, 32);
     }

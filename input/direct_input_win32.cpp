@@ -176,9 +176,14 @@ void CDirectInput::PollJoysticks()
         joystick->Poll();
         joyPrevious[i] = joyCurrent[i];
         if (SUCCEEDED(joystick->GetDeviceState(sizeof(DIJOYSTATE2), &joyCurrent[i])))
+        {
             KeepPressedBits(joyCurrent[i].rgbButtons, 32);
-        else
-            joystick->Acquire();
+            continue;
+        }
+        // Not acquired yet, or the window is in the background: released,
+        // as the keyboard and the mouse read then.
+        joystick->Acquire();
+        ReleaseJoystickState(joyCurrent[i]);
     }
 }
 

@@ -12,7 +12,6 @@ inline constexpr int kSlotCount = 16;
 inline constexpr int kSlotButtonCount = 56;
 inline constexpr int kVirtualButtonCount = 24;
 inline constexpr int kMouseButtonCount = 8;
-inline constexpr int kKeyCodeCount = 256;
 
 // The logical buttons of a slot.
 inline constexpr int kFirstVirtualButton = 8;      // 8..31: keyboard or controller

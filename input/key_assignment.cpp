@@ -1,6 +1,6 @@
 #include "input/key_assignment.h"
 
-#include "input/name_tables.h"
+#include "base/input_codes.h"
 
 namespace input
 {
@@ -72,13 +72,13 @@ Capture DecideKeyCapture(const std::uint32_t (&keys)[kActionCount], std::int8_t 
     return capture;
 }
 
-Capture DecideKeyCapture(const config::ConfigKeys& keys, std::int8_t focused,
+Capture DecideKeyCapture(const std::uint32_t (&keys)[kActionCount], std::int8_t focused,
                          const CDirectInput& input)
 {
     std::uint8_t wentDown[kKeyCodeCount];
     for (int code = 0; code < kKeyCodeCount; ++code)
         wentDown[code] = input.IsKeyTriggered(static_cast<std::uint8_t>(code));
-    return DecideKeyCapture(keys.keyboardKeys, focused, wentDown);
+    return DecideKeyCapture(keys, focused, wentDown);
 }
 
 Capture DecidePadCapture(const std::uint32_t (&codes)[kActionCount], std::int8_t focused,
@@ -126,26 +126,28 @@ Capture DecidePadCapture(const std::uint32_t (&codes)[kActionCount], std::int8_t
     return {};
 }
 
-Capture DecidePadCapture(const config::PadConfig& player, std::int8_t focused, const CInput& input)
+Capture DecidePadCapture(const std::uint32_t (&codes)[kActionCount], std::int8_t focused,
+                         const CInput& input)
 {
     const InputSlot& slot = input.GetSlot(0);
     std::uint8_t rawButtons[kCaptureJoyButtons];
     for (int button = 0; button < kCaptureJoyButtons; ++button)
         rawButtons[button] =
             input.GetJoyButton(slot.joystickIndex, static_cast<std::uint8_t>(button));
-    return DecidePadCapture(player.buttons, focused, slot, rawButtons);
+    return DecidePadCapture(codes, focused, slot, rawButtons);
 }
 
-void ApplyKeyCapture(const Capture& capture, config::ConfigKeys& keys, std::int8_t& focusedAction)
+void ApplyKeyCapture(const Capture& capture, std::uint32_t (&keys)[kActionCount],
+                     std::int8_t& focusedAction)
 {
     if (!capture.happened)
         return;
     for (int i = 0; i < capture.changeCount; ++i)
-        keys.keyboardKeys[capture.changes[i].action] = capture.changes[i].code;
+        keys[capture.changes[i].action] = capture.changes[i].code;
     focusedAction = capture.nextFocus;
 }
 
-void ApplyPadCapture(const Capture& capture, config::PadConfig& player, InputSlot& slot,
+void ApplyPadCapture(const Capture& capture, std::uint32_t (&codes)[kActionCount], InputSlot& slot,
                      std::int8_t& focusedAction)
 {
     if (!capture.happened)
@@ -153,7 +155,7 @@ void ApplyPadCapture(const Capture& capture, config::PadConfig& player, InputSlo
     for (int i = 0; i < capture.changeCount; ++i)
     {
         const CodeChange& change = capture.changes[i];
-        player.buttons[change.action] = change.code;
+        codes[change.action] = change.code;
         slot.joyMap[change.action] = change.code;
         slot.xinputMap[change.action] = change.code;
     }
@@ -162,14 +164,15 @@ void ApplyPadCapture(const Capture& capture, config::PadConfig& player, InputSlo
     focusedAction = capture.nextFocus;
 }
 
-void BindPlayerToSlot(const config::PadConfig& player, InputSlot& slot)
+void BindPlayerToSlot(const std::uint32_t (&codes)[kActionCount], std::uint8_t device,
+                      InputSlot& slot)
 {
     for (int action = 0; action < kActionCount; ++action)
     {
-        slot.joyMap[action] = player.buttons[action];
-        slot.xinputMap[action] = player.buttons[action];
+        slot.joyMap[action] = codes[action];
+        slot.xinputMap[action] = codes[action];
     }
-    slot.joystickIndex = player.device;
+    slot.joystickIndex = device;
 }
 
 } // namespace input

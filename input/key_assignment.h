@@ -3,7 +3,7 @@
 // What a key or button capture on the key assignment pages changes. The
 // pages only show the outcome: the new names in the edit boxes and the focus.
 
-#include "config/config_sections.h"
+#include "base/input_codes.h"
 #include "input/input.h"
 #include "input/input_slot.h"
 
@@ -11,8 +11,6 @@
 
 namespace input
 {
-
-using config::kActionCount;
 
 // The action whose edit box follows each action's after a capture. On the
 // shown boxes they give the reading order of the page, wrapping around.
@@ -50,7 +48,7 @@ struct Capture
 // be assigned.
 Capture DecideKeyCapture(const std::uint32_t (&keys)[kActionCount], std::int8_t focused,
                          const std::uint8_t (&wentDown)[kKeyCodeCount]);
-Capture DecideKeyCapture(const config::ConfigKeys& keys, std::int8_t focused,
+Capture DecideKeyCapture(const std::uint32_t (&keys)[kActionCount], std::int8_t focused,
                          const CDirectInput& input);
 
 // Controller page. `codes` are the player's button codes, `slot` is slot 0
@@ -62,17 +60,21 @@ Capture DecideKeyCapture(const config::ConfigKeys& keys, std::int8_t focused,
 Capture DecidePadCapture(const std::uint32_t (&codes)[kActionCount], std::int8_t focused,
                          const InputSlot& slot,
                          const std::uint8_t (&rawButtons)[kCaptureJoyButtons]);
-Capture DecidePadCapture(const config::PadConfig& player, std::int8_t focused, const CInput& input);
+Capture DecidePadCapture(const std::uint32_t (&codes)[kActionCount], std::int8_t focused,
+                         const CInput& input);
 
 // Store a capture: the codes, and the focus in `focusedAction`.
-void ApplyKeyCapture(const Capture& capture, config::ConfigKeys& keys, std::int8_t& focusedAction);
+void ApplyKeyCapture(const Capture& capture, std::uint32_t (&keys)[kActionCount],
+                     std::int8_t& focusedAction);
 // Also keeps the slot's maps equal to the player's codes, and counts the
 // captured button as already down in the slot so that, still held at the
 // next update, it does not press the newly focused action too.
-void ApplyPadCapture(const Capture& capture, config::PadConfig& player, InputSlot& slot,
+void ApplyPadCapture(const Capture& capture, std::uint32_t (&codes)[kActionCount], InputSlot& slot,
                      std::int8_t& focusedAction);
 
-// Makes the slot read the player's controller through the player's codes.
-void BindPlayerToSlot(const config::PadConfig& player, InputSlot& slot);
+// Makes the slot read the player's controller (its number in enumeration
+// order) through the player's codes.
+void BindPlayerToSlot(const std::uint32_t (&codes)[kActionCount], std::uint8_t device,
+                      InputSlot& slot);
 
 } // namespace input

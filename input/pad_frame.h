@@ -1,44 +1,12 @@
 #pragma once
 
+#include "base/input_codes.h"
 #include "input/device_types.h"
 
 #include <cstdint>
 
 namespace input
 {
-
-// The controller button codes: indexes of a pad frame. A code's text comes
-// from the pad button name table.
-inline constexpr int kPadFrameSize = 48;
-
-enum PadCode : std::uint8_t
-{
-    kDpadUp = 0,
-    kDpadDown = 1,
-    kDpadLeft = 2,
-    kDpadRight = 3,
-    kLeftStickUp = 4,
-    kLeftStickDown = 5,
-    kLeftStickLeft = 6,
-    kLeftStickRight = 7,
-    kLeftStickPush = 8,
-    kRightStickUp = 9,
-    kRightStickDown = 10,
-    kRightStickLeft = 11,
-    kRightStickRight = 12,
-    kRightStickPush = 13,
-    kButton1 = 14,
-    kButton2 = 15,
-    kButton3 = 16,
-    kButton4 = 17,
-    kButton7 = 18,
-    kButton5 = 19,
-    kButton8 = 20,
-    kButton6 = 21,
-    kButton9 = 22,
-    kButton10 = 23,
-    kButton13 = 24,
-};
 
 // One controller's buttons, directions and d-pad as flags (0 or 1), rebuilt
 // for every slot at every update.

@@ -9,6 +9,7 @@
 #include "tests/support/audio_fixtures.h"
 #include "tests/support/temp_folder.h"
 
+#include <algorithm>
 #include <cstring>
 #include <filesystem>
 #include <gtest/gtest.h>
@@ -67,9 +68,10 @@ protected:
         Write(example, "FILENAME:Test;\nLOW:30;\nHI:60;\nLOW:90;\nCLIMAX:165;\nFINALE:170;\n");
         Write(climax, "FILENAME:Test;\nLOW:30;\nHI:60;\nLOW:90;\nCLIMAX:150;\nFINALE:170;\n");
     }
-    static void Write(const std::string& path, const std::string& bytes)
+    static std::string Write(const std::string& path, const std::string& bytes)
     {
         testing_support::WriteBytes(path, std::vector<std::uint8_t>(bytes.begin(), bytes.end()));
+        return path;
     }
 
     testing_support::TempFolder folder;
@@ -201,65 +203,36 @@ TEST_F(Commands, ShowPrintsEverySettingByNameWithItsMeaning)
           u8"radioChat.entries[11].notToAll = 0 (F12: to everyone (全体 checked))\n"})
         EXPECT_NE(text.out.find(Utf8(line)), std::string::npos) << Utf8(line);
 
+    EXPECT_EQ(text.out.find("connectList[1]"), std::string::npos) << "empty slots after the last";
     const ProgramRun json = Vekcfg({"show", "--json", settings});
     EXPECT_EQ(json.exitCode, 0);
-    for (const char8_t* part : {u8"\"screenSize\": {\"value\": 8, \"meaning\": \"1920×1080\"}",
-                                u8"\"port\": 18000,", u8"\"value\": \"go\\n\\tnow\\u0001\""})
-        EXPECT_NE(json.out.find(Utf8(part)), std::string::npos) << Utf8(part);
+    // ASCII only, so that any console and pipe pass it on unchanged.
+    for (const char* part :
+         {"\"screenSize\": {\n      \"value\": 8,\n      \"meaning\": \"1920\\u00d71080\"",
+          "\"port\": 18000,", "\"value\": \"go\\n\\tnow\\u0001\""})
+        EXPECT_NE(json.out.find(part), std::string::npos) << part;
+    EXPECT_TRUE(std::all_of(json.out.begin(), json.out.end(), [](char c) { return c > 0; }));
 }
 
-TEST_F(Commands, UsageErrorsAndUnreadableFilesExitTwoWithTheReason)
-{
-    const std::string newer = folder.File("newer.dat");
-    Write(newer, std::string("\x01\x10\x00\x13", 4));
-    const std::pair<std::vector<std::string>, std::string> rows[] = {
-        {{}, "vekcfg: no command given\nusage: vekcfg check"},
-        {{"check", "--svg"}, "vekcfg: --svg needs the path of the picture to write\nusage: "},
-        {{"check", "--bogus", "m", "t"},
-         "vekcfg: unknown or repeated option \"--bogus\" for check\n"},
-        {{"show", missing}, "vekcfg: cannot read the settings file \"" + missing + "\": "},
-        {{"check-config", newer},
-         "has version 0x13001001; this tool reads versions up to 0x13001000\n"}};
-    for (const auto& [arguments, reason] : rows)
-    {
-        const ProgramRun run = Vekcfg(arguments);
-        EXPECT_EQ(run.exitCode, 2) << reason;
-        EXPECT_EQ(run.out, "") << reason;
-        EXPECT_NE(run.err.find(reason), std::string::npos) << run.err;
-    }
-}
-
-// An argument as the platform's command line gives it.
-std::string Native(const char8_t* utf8)
-{
-    std::string text = Utf8(utf8);
-#ifdef _WIN32
-    cli::Cp932FromUtf8(Utf8(utf8), &text);
-#endif
-    return text;
-}
-
-// Every page changed, each setting by its number or by what it means.
-std::vector<std::string> ChangeEveryPage(const std::string& file)
-{
-    return {"set", file, "graphics.screenSize=1280x960", "graphics.fullScreen=on",
-            "game.seVolume=-12.50 dB", "keys.keyboardKeys[4]=Z", "keys.keyboardKeys[14]=up",
-            "keys.padConfigs[1].buttons[14]=BUTTON3", "keys.padConfigs[1].buttons[16]=14",
-            "keys.padConfigs[3].device=0", "radioChat.entries[1].notToAll=not to everyone",
-            "radioChat.entries[11].text=" + Native(u8"援護を頼む"), "network.keyResponse=2",
-            "network.lobbyId=" + Native(u8"ロビー"), "network.connectList+=192.168.1.*",
-            // Listed when added, but its slot counts as free.
-            "network.connectList+=*.*.*.*", "network.allowList+=10.0.0.1",
-            "network.allowList+=10.0.0.2", "network.allowList-=010.0.0.1",
-            "replay.replayLock[29]=1", "userBgm.rows[9].musicPath=" + Native(u8"C:\\音楽\\曲.ogg")};
-}
-
-TEST_F(Commands, SetTakesANumberOrAMeaningAndShowReadsItBack)
+// Every page changed, each setting by its number or by what it means; then
+// each file's show --json applied over the other makes it again, byte for byte.
+TEST_F(Commands, SetTakesANumberOrAMeaningAndApplyOfWhatShowPrintsCopiesAFile)
 {
     config::CSaveConfig record;
     record.ResetAll();
-    ASSERT_TRUE(record.SaveToPath(settings.c_str()));
-    const ProgramRun set = Vekcfg(ChangeEveryPage(settings));
+    const std::string defaults = folder.File("defaults.dat"), tree = folder.File("tree.json");
+    ASSERT_TRUE(record.SaveToPath(settings.c_str()) && record.SaveToPath(defaults.c_str()));
+    const ProgramRun set = Vekcfg(
+        {"set", settings, "graphics.screenSize=1280x960", "graphics.fullScreen=on",
+         "game.seVolume=-12.50 dB", "keys.keyboardKeys[4]=Z", "keys.keyboardKeys[14]=up",
+         "keys.padConfigs[1].buttons[14]=BUTTON3", "keys.padConfigs[1].buttons[16]=14",
+         "keys.padConfigs[3].device=0", "radioChat.entries[1].notToAll=not to everyone",
+         "radioChat.entries[11].text=" + Utf8(u8"援護を頼む"), "network.keyResponse=2",
+         "network.lobbyId=" + Utf8(u8"ロビー"), "network.connectList+=192.168.1.*",
+         // Listed when added, but its slot counts as free.
+         "network.connectList+=*.*.*.*", "network.allowList+=10.0.0.1",
+         "network.allowList+=10.0.0.2", "network.allowList-=010.0.0.1", "replay.replayLock[29]=1",
+         "userBgm.rows[9].musicPath=" + Utf8(u8"C:\\音楽\\曲.ogg")});
     EXPECT_EQ(set.exitCode, 0) << set.err;
     EXPECT_EQ(set.out + set.err, "");
     const std::string out = Vekcfg({"show", settings}).out;
@@ -271,99 +244,126 @@ TEST_F(Commands, SetTakesANumberOrAMeaningAndShowReadsItBack)
              u8"userBgm.rows[9].musicPath = \"C:\\音楽\\曲.ogg\"\n",
          })
         EXPECT_NE(out.find(Utf8(line)), std::string::npos) << Utf8(line);
-}
-
-TEST_F(Commands, ApplyOfWhatShowPrintsMakesAFileTheToolWroteAgainByteForByte)
-{
-    const std::string defaults = folder.File("defaults.dat"), changed = folder.File("changed.dat");
-    config::CSaveConfig record;
-    record.ResetAll();
-    ASSERT_TRUE(record.SaveToPath(defaults.c_str()));
-    ASSERT_TRUE(record.SaveToPath(changed.c_str()));
-    ASSERT_EQ(Vekcfg(ChangeEveryPage(changed)).exitCode, 0);
-    // Each is applied over the other, so that every value and list changes.
-    const std::string tree = folder.File("tree.json"), target = folder.File("target.dat");
-    for (const auto& [from, over] : {std::pair{defaults, changed}, std::pair{changed, defaults}})
+    const std::vector<std::uint8_t> changed = ReadBytes(settings), initial = ReadBytes(defaults);
+    const std::string trees[] = {Vekcfg({"show", "--json", settings}).out,
+                                 Vekcfg({"show", "--json", defaults}).out};
+    for (int i = 0; i < 2; ++i)
     {
-        testing_support::WriteBytes(target, ReadBytes(over));
-        Write(tree, Vekcfg({"show", "--json", from}).out);
-        EXPECT_EQ(Vekcfg({"apply", target, tree}).err, "");
-        EXPECT_EQ(ReadBytes(target), ReadBytes(from)) << from;
+        Write(tree, trees[i]);
+        EXPECT_EQ(Vekcfg({"apply", i == 0 ? defaults : settings, tree}).err, "");
     }
+    EXPECT_TRUE(ReadBytes(defaults) == changed && ReadBytes(settings) == initial);
 }
 
+// One row per rule that refuses a command or a change: every refusal exits 2
+// with a message naming the setting or the file, and leaves the file as it
+// was.
 TEST_F(Commands, EveryKindOfRefusalExitsTwoNamingTheSettingAndLeavesTheFile)
 {
     config::CSaveConfig record;
     record.ResetAll();
     ASSERT_TRUE(record.SaveToPath(settings.c_str()));
-    std::vector<std::uint8_t> newer = ReadBytes(settings);
-    newer[0] = 0x01;
-    const std::string newerFile = folder.File("newer.dat"), unreadable = folder.File("folder.dat");
-    const std::string broken = folder.File("broken.json"), emoji = folder.File("emoji.json");
-    testing_support::WriteBytes(newerFile, newer);
+    const std::vector<std::uint8_t> image = ReadBytes(settings);
+    int files = 0;
+    const auto file = [&](const std::string& bytes)
+    { return Write(folder.File("f" + std::to_string(files++)), bytes); };
+    // The settings image with `bytes` at `offset` and its last `cut` bytes gone.
+    const auto patched = [&](const std::string& bytes, std::size_t offset, std::size_t cut = 0)
+    {
+        return file(
+            std::string(image.begin(), image.end() - cut).replace(offset, bytes.size(), bytes));
+    };
+    const auto apply = [&](const std::string& json) {
+        return std::vector<std::string>{"apply", settings, file(json)};
+    };
+    const std::string unreadable = folder.File("folder.dat");
     std::filesystem::create_directory(unreadable);
-    Write(broken, "{\"graphics\": {\"screenSize\": 3,}}");
-    const std::string twice = folder.File("twice.json"), surrogate = folder.File("surrogate.json"),
-                      zero = folder.File("zero.json");
-    Write(twice, "{\"a\": 1, \"a\": 2}");
-    Write(surrogate, "[\"\\ud83d\"]");
-    Write(zero, "{\n  \"a\": 01\n}");
-    // The command line on Windows cannot carry a character that code page
-    // 932 has no form for; JSON can.
-    Write(emoji, "{\"network\": {\"lobbyId\": \"\\ud83d\\ude00\"}}");
-    const std::string tooLong = "radioChat.entries[0].text=" + std::string(38, 'r');
     std::vector<std::string> overFull{"set", settings};
     for (int slot = 0; slot <= config::kConnectSlotCount; ++slot)
         overFull.push_back("network.connectList+=10.0.0." + std::to_string(slot + 1));
+    const std::string program = file("MZ\x90" + std::string(6873, '\0'));
 
     const struct
     {
-        const char* kind;
+        const char* rule;
         std::vector<std::string> arguments;
         std::string named;
     } rows[] = {
+        {"no command", {}, "vekcfg: no command given\nusage: vekcfg check"},
+        {"an option without its value", {"check", "--svg"}, "--svg needs the path of the picture"},
+        {"an unknown option", {"check", "--bogus", "m", "t"}, "option \"--bogus\" for check\n"},
         {"unknown name", {"set", settings, "graphics.size=1"}, "graphics.size"},
-        {"out of range", {"set", settings, "graphics.screenSize=12"}, "graphics.screenSize: "},
-        {"newer version", {"set", newerFile, "graphics.screenSize=1"}, "newer.dat"},
-        {"missing file", {"set", missing, "graphics.screenSize=1"}, missing},
-        {"unreadable file", {"set", unreadable, "graphics.screenSize=1"}, "folder.dat"},
-        {"not in code page 932", {"apply", settings, emoji}, "network.lobbyId: "},
-        {"text too long", {"set", settings, tooLong}, "radioChat.entries[0].text: "},
-        {"list over 24", overFull, "network.connectList: "},
-        {"bad JSON", {"apply", settings, broken}, "line 1, column 31"},
-        {"a member given twice",
-         {"apply", settings, twice},
-         "column 13: the member \"a\" is given twice"},
-        {"a lone high surrogate",
-         {"apply", settings, surrogate},
-         "column 9: a high surrogate without its low one"},
-        {"a leading zero", {"apply", settings, zero}, "line 2, column 9: ',' or '}' expected"},
-        {"no such resolution",
-         {"set", settings, "graphics.screenSize=1280x961"},
-         "graphics.screenSize: "},
-        {"a level no slider stores", {"set", settings, "game.bgmVolume=-3000"}, "game.bgmVolume: "},
-        {"a reserved key",
-         {"set", settings, "keys.keyboardKeys[3]=ESCAPE"},
-         "keys.keyboardKeys[3]: "},
+        {"a choice out of range", {"set", settings, "graphics.screenSize=12"}, "screenSize: "},
+        {"no such resolution", {"set", settings, "graphics.screenSize=1280x961"}, "screenSize: "},
+        {"a switch of 2", {"set", settings, "graphics.fullScreen=2"}, "fullScreen: "},
+        {"a lock by a word", {"set", settings, "replay.replayLock[0]=maybe"}, "replayLock[0]: "},
+        {"a recipient of 2", {"set", settings, "radioChat.entries[0].notToAll=2"}, "notToAll: "},
+        {"a level no slider stores", {"set", settings, "game.bgmVolume=-3000"}, "bgmVolume: "},
+        {"a port above 65535", {"set", settings, "network.port=65536"}, "network.port: "},
+        {"a controller above 255", {"set", settings, "keys.padConfigs[0].device=256"}, "device: "},
+        {"a reserved key", {"set", settings, "keys.keyboardKeys[3]=ESCAPE"}, "keyboardKeys[3]: "},
         {"no such button", {"set", settings, "keys.padConfigs[0].buttons[0]=48"}, "buttons[0]: "},
+        {"a stick direction no page assigns",
+         {"set", settings, "keys.padConfigs[0].buttons[4]=5", "keys.padConfigs[0].buttons[5]=4"},
+         "buttons[4]: no page changes this one"},
+        {"a code left on two actions", {"set", settings, "keys.keyboardKeys[4]=Z"}, "same code"},
+        {"a text too long",
+         {"set", settings, "radioChat.entries[0].text=" + std::string(38, 'r')},
+         "entries[0].text: "},
+        {"a text code page 932 lacks", apply(R"({"network": {"lobbyId": "\ud83d\ude00"}})"),
+         "network.lobbyId: "},
+        {"a near match only (U+301C)", apply(R"({"network": {"directId": "\u301c"}})"),
+         "directId: the text holds"},
         {"a section, not a field", {"set", settings, "graphics=1"}, "graphics"},
         {"a fifth player", {"set", settings, "keys.padConfigs[4].device=0"}, "padConfigs[4]"},
-        {"three octets", {"set", settings, "network.allowList+=1.2.3"}, "network.allowList: "},
-        {"an empty octet", {"set", settings, "network.denyList+=1..1.1"}, "network.denyList: "},
-    };
-    const auto contents = [](const std::string& file) {
-        return std::filesystem::is_regular_file(file) ? ReadBytes(file)
-                                                      : std::vector<std::uint8_t>();
+        {"+= on a value", {"set", settings, "graphics.fullScreen+=1"}, "fullScreen: "},
+        {"a list given one value", {"set", settings, "network.allowList=1.2.3.4"}, "allowList: "},
+        {"a list given one value in JSON", apply(R"({"network": {"denyList": "1.2.3.4"}})"),
+         "denyList: "},
+        {"a value given a list", apply(R"({"graphics": {"fullScreen": [1]}})"), "fullScreen: "},
+        {"three octets", {"set", settings, "network.allowList+=1.2.3"}, "allowList: "},
+        {"-= of an absent address", {"set", settings, "network.allowList-=1.2.3.4"}, "it is empty"},
+        {"-= of an address not listed",
+         {"set", settings, "network.denyList+=1.2.3.4", "network.denyList-=1.2.3.5"},
+         "it holds 001.002.003.004"},
+        {"+= on a full 接続 list", overFull, "network.connectList: "},
+        {"JSON true for a switch", apply(R"({"graphics": {"fullScreen": true}})"), "fullScreen: "},
+        {"JSON number for a text", apply(R"({"network": {"lobbyId": 1}})"), "lobbyId: "},
+        {"a fraction", apply(R"({"network": {"port": 1.5}})"), "not a whole number"},
+        {"a number beyond a double", apply("[1E400]"), "number overflow parsing '1E400'"},
+        {"a member given twice", apply(R"({"a": 1, "a": 2})"), "\"a\" is given twice"},
+        {"deeper than the tree", apply("[[[[[[[1]]]]]]]"), "nested deeper than 6"},
+        {"invalid UTF-8", apply("[\"\xC3\"]"), "ill-formed UTF-8"},
+        {"a lone surrogate", apply(R"(["\ud83d"])"), "column 9: syntax error"},
+        {"bad JSON", apply(R"({"graphics": {"screenSize": 3,}})"), "line 1, column 31"},
+        {"not a settings file", {"set", program, "graphics.fullScreen=1"}, "0x00905A4D, is no"},
+        {"a newer version", {"check-config", patched("\x01", 0)}, "0x13001001, is above"},
+        {"the first layout",
+         {"set", patched(std::string("\0\x10\0\x10", 4), 0), "game.seVolume=0"},
+         "first"},
+        {"a section length",
+         {"show", patched("\x15", 4)},
+         "graphics section is 21 bytes where this tool writes 20"},
+        {"a size", {"show", patched("", 0, 1)}, "6875 bytes where its sections and address lists"},
+        {"a list count it does not hold",
+         {"set", patched("\x01", 536), "game.seVolume=0"},
+         "its replay section is 0 bytes"},
+        {"a missing file", {"show", missing}, "cannot read the settings file \"" + missing},
+        {"an unreadable file", {"set", unreadable, "graphics.screenSize=1"}, "folder.dat"},
     };
     for (const auto& row : rows)
     {
-        const std::string& file = row.arguments[1];
-        const std::vector<std::uint8_t> before = contents(file);
+        const std::string path = row.arguments.size() > 1 ? row.arguments[1] : "";
+        const std::vector<std::uint8_t> before =
+            std::filesystem::is_regular_file(path) ? ReadBytes(path) : std::vector<std::uint8_t>();
         const ProgramRun run = Vekcfg(row.arguments);
-        EXPECT_EQ(run.exitCode, 2) << row.kind;
-        EXPECT_NE(run.err.find(row.named), std::string::npos) << row.kind << ": " << run.err;
-        EXPECT_EQ(contents(file), before) << row.kind;
+        EXPECT_EQ(run.exitCode, 2) << row.rule;
+        EXPECT_EQ(run.out, "") << row.rule;
+        EXPECT_NE(run.err.find(row.named), std::string::npos) << row.rule << ": " << run.err;
+        if (std::filesystem::is_regular_file(path))
+        {
+            EXPECT_EQ(ReadBytes(path), before) << row.rule;
+        }
     }
 }
 

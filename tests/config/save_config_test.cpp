@@ -175,4 +175,6 @@ TEST(SaveConfigObject, ClonesAreDeepAndResetsTouchOnlyTheirFields)
     EXPECT_EQ(record.Keys()->padConfigs[2].device, 2);
     EXPECT_EQ(record.Keys()->padConfigs[1].device, 3) << "other players keep their pad";
     EXPECT_FALSE(record.ResetPadButtons(4));
+    EXPECT_TRUE(record.ResetGame() && record.ResetRadioChat());
+    EXPECT_EQ(record.RadioChat()->entries[11].text[39], 0) << "a reset empties the texts";
 }

@@ -34,6 +34,8 @@ struct Corpus
         testing_support::WriteBytes((folder / name).string(), {bytes.begin(), bytes.end()});
     }
     void Case(const std::string& command) { cases << command << '\n'; }
+    // A command with text in UTF-8, as a terminal gives it.
+    void Case(const char8_t* command) { Case(reinterpret_cast<const char*>(command)); }
 };
 
 std::string CrLf(const std::string& text)
@@ -173,6 +175,14 @@ void SettingsFiles(Corpus& corpus)
     std::memset(record.Network()->connectList[0].octets, '9',
                 sizeof record.Network()->connectList[0]);
     corpus.Write("unterminated.dat", record.SaveToBytes());
+
+    // Changed below by set and apply with Japanese texts.
+    record.ResetAll();
+    corpus.Write("defaults.dat", record.SaveToBytes());
+    corpus.Write("japanese.json",
+                 std::string(R"({"network": {"directId": "\u30c0\u30a4\u30ec\u30af\u30c8"},)") +
+                     reinterpret_cast<const char*>(
+                         u8R"( "radioChat": {"entries": [{"text": "援護を頼む"}]}})"));
 }
 
 } // namespace
@@ -212,6 +222,11 @@ int main(int argc, char** argv)
     corpus.Case("set rows.dat graphics.screenSize=1280x960 keys.keyboardKeys[4]=Z "
                 "keys.keyboardKeys[14]=UP radioChat.entries[1].text=roger");
     corpus.Case("set rows.dat graphics.screenSize=1280x961");
+    corpus.Case(u8"set defaults.dat radioChat.entries[2].text=了解！ network.lobbyId=ロビー～");
+    corpus.Case(u8"set defaults.dat radioChat.entries[2].text=😀");
+    corpus.Case(u8"set defaults.dat radioChat.entries[3].text=〜¥");
+    corpus.Case("apply defaults.dat japanese.json");
+    corpus.Case("show defaults.dat");
     corpus.Case("show rows.dat");
     return 0;
 }

@@ -2,7 +2,7 @@
 // the resets, the tabs that show the pages and the edit naming the action.
 // Capturing a real key press is a black-box run (tests/e2e).
 #include "input/input.h"
-#include "input/name_tables.h"
+#include "base/input_codes.h"
 #include "resources/resource.h"
 #include "tests/gui/gui_harness.h"
 

@@ -1,5 +1,6 @@
 // The whole input update on the stand-in devices: what a slot makes of the
 // keyboard, the mouse and the controllers, and captures on live input.
+#include "config/config_sections.h"
 #include "input/input.h"
 #include "input/key_assignment.h"
 #include "input/virtual_devices_posix.h"
@@ -95,6 +96,7 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     joystick.rgdwPOV[0] = 4500;
     Devices().xinputConnected[1] = true;
     Devices().xinput[1].Gamepad = {XINPUT_GAMEPAD_B, 0, 0, 0, 0, 0, 0};
+    EXPECT_EQ(in.GetJoystickState(1)->rgdwPOV[0], 0xFFFFFFFFu) << "released before its first read";
     in.Update();
     EXPECT_EQ(in.GetJoystickCount(), 2);
     EXPECT_TRUE(in.GetJoystickInfo(0) == nullptr && in.GetJoystickState(0) == nullptr);
@@ -132,6 +134,10 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     Devices().xinputConnected[0] = false;
     in.Update();
     EXPECT_EQ(slot0.analogValid, 0u) << "unplugged, with no controller of its own";
+    Devices().foreground = false;
+    in.Update();
+    EXPECT_EQ(in.GetJoyButton(1, 0) * 2 + (in.GetJoystickState(1)->rgdwPOV[0] != 0xFFFFFFFFu), 0)
+        << "released in the background, the POV centred";
 }
 
 TEST_F(InputUpdate, CapturesReadTheLiveDevices)
@@ -141,12 +147,12 @@ TEST_F(InputUpdate, CapturesReadTheLiveDevices)
     keys.keyboardKeys[16] = 0x30;
     for (int action = 0; action < kActionCount; ++action)
         keys.padConfigs[0].buttons[action] = static_cast<std::uint32_t>(action);
-    BindPlayerToSlot(keys.padConfigs[0], in.GetSlot(0));
+    BindPlayerToSlot(keys.padConfigs[0].buttons, 0, in.GetSlot(0));
     Devices().keys[0x30] = 0x80;
     Devices().joysticks[0].state.rgbButtons[12] = 0x80;
     in.Update();
-    EXPECT_EQ(DecideKeyCapture(keys, 14, in).changes[1].code, 0x30u);
-    EXPECT_EQ(DecidePadCapture(keys.padConfigs[0], 14, in).changes[0].code, 24u);
+    EXPECT_EQ(DecideKeyCapture(keys.keyboardKeys, 14, in).changes[1].code, 0x30u);
+    EXPECT_EQ(DecidePadCapture(keys.padConfigs[0].buttons, 14, in).changes[0].code, 24u);
 }
 
 } // namespace

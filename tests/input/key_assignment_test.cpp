@@ -62,7 +62,7 @@ TEST(KeyCapture, AKeyGoesToTheFocusedActionAndItsOwnerGetsTheFormerKey)
         EXPECT_EQ(Outcome(capture), std::make_pair(changes, next)) << "focused " << int(focused);
         config::ConfigKeys stored = keys;
         std::int8_t focus = focused;
-        ApplyKeyCapture(capture, stored, focus);
+        ApplyKeyCapture(capture, stored.keyboardKeys, focus);
         for (const auto& [action, code] : changes)
             EXPECT_EQ(stored.keyboardKeys[action], code);
         EXPECT_EQ(focus, next < 0 ? focused : next);
@@ -86,6 +86,7 @@ TEST(PadCapture, AButtonIsExchangedWithItsActionOrStoredAloneAndSticksAreNever)
         {9, 14, {}, {{14, 9}, {9, 14}}, 13},
         {12, 14, {}, {{14, 12}, {12, 14}}, 13},
         {9, -1, {12}, {{9, 24}}, 9}, // raw button 12 is BUTTON13
+        {6, -1, {12}, {{6, 24}}, 7}, // stored alone, no skip to the push
         {15, -1, {0}, {}, -1},       // held, but action 14 has it
         {15, -1, {1, 12}, {}, -1},   // the lowest held button decides
         {14, 4, {12}, {}, -1},       // stick directions
@@ -97,7 +98,7 @@ TEST(PadCapture, AButtonIsExchangedWithItsActionOrStoredAloneAndSticksAreNever)
     {
         InputSlot slot;
         ResetSlot(slot, 0, true);
-        BindPlayerToSlot(keys.padConfigs[0], slot);
+        BindPlayerToSlot(keys.padConfigs[0].buttons, keys.padConfigs[0].device, slot);
         if (pressed >= 0)
             slot.pressed[kFirstVirtualButton + pressed] = 1;
         std::uint8_t raw[kCaptureJoyButtons] = {};
@@ -111,7 +112,7 @@ TEST(PadCapture, AButtonIsExchangedWithItsActionOrStoredAloneAndSticksAreNever)
         // counts as already down: held on, it presses no further action.
         config::PadConfig player = keys.padConfigs[0];
         std::int8_t focus = focused;
-        ApplyPadCapture(capture, player, slot, focus);
+        ApplyPadCapture(capture, player.buttons, slot, focus);
         for (const auto& [action, code] : changes)
             EXPECT_EQ(std::make_pair(slot.joyMap[action], slot.xinputMap[action]),
                       std::make_pair(code, player.buttons[action]));

@@ -1,8 +1,8 @@
 // What a slot makes of the devices: the controller frames of DirectInput and
 // XInput, the sticks under the movement keys, and the names of keys and
 // buttons.
+#include "base/input_codes.h"
 #include "input/input_slot.h"
-#include "input/name_tables.h"
 #include "input/pad_frame.h"
 
 #include <array>

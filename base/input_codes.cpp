@@ -1,4 +1,4 @@
-#include "input/name_tables.h"
+#include "base/input_codes.h"
 
 #include <array>
 
