@@ -55,13 +55,13 @@ TEST(RiffReader, FindsTheFormatAndTheDataWhereTheRulesPutThem)
         {"a non-PCM fmt chunk of 16 bytes has none",
          Wave(Bytes(ieeeFloat.begin(), ieeeFloat.begin() + 16)), WaveSpec{.formatTag = 3}, 7},
     };
-    for (const auto& [what, file, spec, dataBytes] : cases)
+    for (const auto& [what, file, wave, dataBytes] : cases)
     {
         DecodedAudio audio;
         ASSERT_TRUE(sound::ReadWaveFromMemory(file.data(), file.size(), &audio)) << what;
         // The 16 bytes of the chunk, the count of extra bytes, the extra bytes.
-        Bytes block = FormatChunkBody(spec);
-        block.resize(18 + spec.extra.size());
+        Bytes block = FormatChunkBody(wave);
+        block.resize(18 + wave.extra.size());
         const auto* format = reinterpret_cast<const std::uint8_t*>(audio.format);
         EXPECT_EQ(Bytes(format, format + sound::FormatBytes(*audio.format)), block) << what;
         EXPECT_EQ(Bytes(audio.data, audio.data + audio.dataBytes), PatternBytes(dataBytes)) << what;

@@ -44,7 +44,7 @@ Bytes MakeWave(const WaveSpec& fixture);
 Bytes MakeWaveOfLength(double seconds);
 
 // A tone in every channel whose level at each time is `dbfs(seconds)` (dB
-// below full scale), in the spec's PCM or float (tag 3) format; the wave
+// below full scale), in the given PCM or float (tag 3) format; the wave
 // holds whole frames of `seconds`.
 using LevelAt = std::function<double(double seconds)>;
 Bytes MakeToneWave(const WaveSpec& format, double seconds, const LevelAt& dbfs);
