@@ -138,6 +138,7 @@ TEST(SaveConfigLists, EntriesComeAndGoInOrderOrNotAtAll)
     for (int i = 1; i <= 24; ++i)
         ASSERT_TRUE(record.AddConnectEntry(Entry(std::to_string(i).c_str())));
     EXPECT_FALSE(record.AddConnectEntry(Entry("99")));
+    EXPECT_EQ(config::FirstEmptyConnectSlot(*record.Network()), -1);
     EXPECT_FALSE(record.RemoveAllowEntry(-1) || record.RemoveAllowEntry(4) ||
                  record.RemoveConnectEntry(-1) || record.RemoveConnectEntry(24));
     ASSERT_TRUE(record.RemoveAllowEntry(1) && record.RemoveConnectEntry(0));
@@ -175,6 +176,8 @@ TEST(SaveConfigObject, ClonesAreDeepAndResetsTouchOnlyTheirFields)
     EXPECT_EQ(record.Keys()->padConfigs[2].device, 2);
     EXPECT_EQ(record.Keys()->padConfigs[1].device, 3) << "other players keep their pad";
     EXPECT_FALSE(record.ResetPadButtons(4));
-    EXPECT_TRUE(record.ResetGame() && record.ResetRadioChat());
-    EXPECT_EQ(record.RadioChat()->entries[11].text[39], 0) << "a reset empties the texts";
+    EXPECT_TRUE(record.ResetGame() && record.ResetUserBgm() && record.ResetRadioChat());
+    CSaveConfig reset = Marked();
+    reset.ResetAll();
+    EXPECT_EQ(reset.RadioChat()->entries[11].text[39], 0) << "a reset empties the texts";
 }

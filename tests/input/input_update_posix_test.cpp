@@ -48,7 +48,7 @@ TEST_F(InputUpdate, AHeldKeyPressesOnceOnEverySlotCountsItsTimeAndSteersTheStick
     CInput& in = Start();
     in.SetFrameTime(16);
     Devices().mouse.rgbButtons[1] = 0x80;
-    Devices().mouse.lZ = 120;
+    Devices().mouse.lZ = 6; // one notch exactly
     Devices().cursorY = -5;
     const int w = kFirstVirtualButton + 4;
     const std::uint32_t held[] = {1, 1, 1, 0, 0}, heldTime[] = {0, 16, 32, 0, 0};
@@ -96,6 +96,7 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     joystick.rgdwPOV[0] = 4500;
     Devices().xinputConnected[1] = true;
     Devices().xinput[1].Gamepad = {XINPUT_GAMEPAD_B, 0, 0, 0, 0, 0, 0};
+    in.GetSlot(1).xinputMap[3] = 0xFF; // a controller read by DirectInput uses its own map
     EXPECT_EQ(in.GetJoystickState(1)->rgdwPOV[0], 0xFFFFFFFFu) << "released before its first read";
     in.Update();
     EXPECT_EQ(in.GetJoystickCount(), 2);
@@ -115,9 +116,9 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
 
     Devices().xinputConnected[0] = true;
     Devices().xinput[0].Gamepad = {XINPUT_GAMEPAD_A, 0, 0, 32767, 32767, 0, 0};
-    in.SetFrameTime(16);
-    in.GetSlot(0).vibrationLeft = 1000;
-    in.GetSlot(0).vibrationRight = 320;
+    in.SetFrameTime(1000);
+    in.GetSlot(0).vibrationLeft = 30000;
+    in.GetSlot(0).vibrationRight = 20000;
     in.Update();
     EXPECT_EQ(slot0.current[kFirstVirtualButton + 14], 1u);
     EXPECT_FLOAT_EQ(slot0.leftX, 1.0f);
@@ -125,8 +126,8 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     EXPECT_EQ(slot1.current[kFirstVirtualButton + 15], 1u);
     EXPECT_EQ(slot1.current[kFirstVirtualButton + 14], 0u);
     EXPECT_EQ(in.GetSlot(2).analogValid, 0u);
-    EXPECT_EQ(Devices().vibration[0].wLeftMotorSpeed, 1000);
-    EXPECT_EQ(slot0.vibrationLeft, 680);
+    EXPECT_EQ(Devices().vibration[0].wLeftMotorSpeed, 30000);
+    EXPECT_EQ(slot0.vibrationLeft, 10000);
     EXPECT_EQ(slot0.vibrationRight, 0);
     in.GetSlot(0).vibrationLeft = 0;
     in.Update();

@@ -38,6 +38,7 @@ TEST(JoystickFrame, DirectionsCountBeyond500AndAxesRestBelow100)
     const std::tuple<Axes, std::uint32_t, RightStickOptions, Entries, Axes> rows[] = {
         {{}, 0xFFFF, {}, {}, {}},
         {{}, 4500, {}, {kDpadUp, kDpadRight}, {}},
+        {{}, 13500, {}, {kDpadDown, kDpadRight}, {}},
         {{}, 18000, {}, {kDpadDown}, {}},
         {{}, 31500, {}, {kDpadUp, kDpadLeft}, {}},
         {{0, -501}, kCentred, {}, {kLeftStickUp}, {0, -501}},

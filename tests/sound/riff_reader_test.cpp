@@ -1,6 +1,8 @@
 // The RIFF rules of wave files, read from memory.
+#include "sound/byte_source.h"
 #include "sound/riff_reader.h"
 #include "tests/support/audio_fixtures.h"
+#include "tests/support/temp_folder.h"
 
 #include <cstring>
 #include <gtest/gtest.h>
@@ -28,6 +30,26 @@ Bytes Wave(const Bytes& format, std::uint32_t claimed = 7)
 }
 
 } // namespace
+
+// Both sources read within their bytes only, an empty read included.
+TEST(ByteSources, ReadNothingPastTheEnd)
+{
+    const testing_support::TempFolder folder;
+    const Bytes four = PatternBytes(4);
+    testing_support::WriteBytes(folder.File("four"), four);
+    sound::MemorySource memory(four.data(), four.size());
+    sound::FileSource file;
+    ASSERT_TRUE(file.Open(folder.File("four").c_str()));
+    const std::tuple<std::uint64_t, std::size_t, bool> rows[] = {
+        {3, 1, true}, {4, 0, true}, {3, 2, false}, {5, 0, false}};
+    for (sound::ByteSource* source : std::initializer_list<sound::ByteSource*>{&memory, &file})
+        for (const auto& [offset, size, read] : rows)
+        {
+            std::uint8_t byte = 0;
+            EXPECT_EQ(source->ReadAt(offset, &byte, size), read) << offset << " " << size;
+            EXPECT_EQ(byte, read && size == 1 ? four[3] : 0) << offset;
+        }
+}
 
 TEST(RiffReader, FindsTheFormatAndTheDataWhereTheRulesPutThem)
 {

@@ -118,6 +118,7 @@ TEST_F(SoundBufferTest, ABufferIsReleasedTwiceAndOpenedAgainEvenFromItsOwnName)
     EXPECT_EQ(buffer.GetInfo().dataBytes, 8000u);
     EXPECT_TRUE(buffer.Release());
     EXPECT_TRUE(buffer.Release());
+    EXPECT_STREQ(buffer.GetName(), "");
     ASSERT_TRUE(buffer.Open(first.c_str(), 1, kCapsStatic));
     EXPECT_EQ(buffer.GetSharedCount(), 1u);
     ASSERT_TRUE(buffer.Open(buffer.GetName(), 1, kCapsStatic));

@@ -238,6 +238,7 @@ TEST(TensionQuery, TheGameAsksACopyForTheLevelAndTheFinaleAtATime)
     EXPECT_STREQ(tension::LevelMessageName(L), "LowTension") << "as the checks name it";
     copy.SetLoopStart(60.0f);
     EXPECT_EQ(copy.GetTension(215.0f), TensionLevel::Low) << "folded to 60 + 35 s";
+    EXPECT_EQ(copy.GetTension(180.0f), N) << "the last entry itself is not folded";
 }
 
 TEST(TensionLoad, FilesAreReadInTextModeAndNamedByTheirPathUntilAnEntryNamesThem)
