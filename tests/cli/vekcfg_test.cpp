@@ -295,6 +295,7 @@ TEST_F(Commands, EveryKindOfRefusalExitsTwoNamingTheSettingAndLeavesTheFile)
         {"an option without its value", {"check", "--svg"}, "--svg needs the path of the picture"},
         {"an empty value", {"check", "--svg", "", "m", "t"}, "--svg needs the path of the picture"},
         {"an unknown option", {"check", "--bogus", "m", "t"}, "option \"--bogus\" for check\n"},
+        {"an operand too many", {"draft", "m", "t", "x"}, "draft needs MUSIC [OUT]"},
         {"unknown name", {"set", settings, "graphics.size=1"}, "graphics.size"},
         {"a choice out of range", {"set", settings, "graphics.screenSize=12"}, "screenSize: "},
         {"no such resolution", {"set", settings, "graphics.screenSize=1280x961"}, "screenSize: "},

@@ -40,10 +40,10 @@ TEST(KeyCapture, AKeyGoesToTheFocusedActionAndItsOwnerGetsTheFormerKey)
     const config::ConfigKeys keys = DefaultKeys();
     // The focused action, the keys that went down, what changes, the next focus.
     const std::tuple<std::int8_t, std::vector<int>, Changes, int> rows[] = {
-        {14, {kX}, {{16, kZ}, {14, kX}}, 15},     // X was action 16's
-        {14, {kZ}, {}, 15},                       // its own key only moves the focus
-        {23, {0x30}, {{23, 0x30}}, 22},           // a key no action has
-        {17, {0x30}, {{17, 0x30}}, 19},           // the focus goes on by the table
+        {14, {kX}, {{16, kZ}, {14, kX}}, 15}, // X was action 16's
+        {14, {kZ}, {}, 15},                   // its own key only moves the focus
+        {23, {0x30}, {{23, 0x30}}, 22},       // a key no action has
+        {17, {0x30}, {{17, 0x30}}, 19},       // the focus goes on by the table
         {10, {0x30}, {{10, 0x30}}, 11},
         {8, {kX, kZ}, {{14, 0x11}, {8, kZ}}, 23}, // the lower code of two
         {0, {kX}, {{16, 0x50}, {0, kX}}, 1},      // before any focus: hidden action 0
@@ -90,9 +90,9 @@ TEST(PadCapture, AButtonIsExchangedWithItsActionOrStoredAloneAndSticksAreNever)
         {9, -1, {12}, {{9, 24}}, 9}, // raw button 12 is BUTTON13
         {6, -1, {12}, {{6, 24}}, 7}, // stored alone, no skip to the push
         {4, -1, {12}, {{4, 24}}, 5},
-        {15, -1, {0}, {}, -1},       // held, but action 14 has it
-        {15, -1, {1, 12}, {}, -1},   // the lowest held button decides
-        {14, 4, {12}, {}, -1},       // stick directions
+        {15, -1, {0}, {}, -1},     // held, but action 14 has it
+        {15, -1, {1, 12}, {}, -1}, // the lowest held button decides
+        {14, 4, {12}, {}, -1},     // stick directions
         {14, 12, {12}, {}, -1},
         {14, -1, {}, {}, -1},
         {24, 16, {}, {}, -1},
