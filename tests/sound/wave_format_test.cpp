@@ -1,5 +1,6 @@
-// The static buffer's format rule as every build applies it, at edges the
-// real device's table (direct_sound_win32_test.cpp) proves on Windows.
+// The static buffer's format rule as every build applies it, at edges of its
+// terms; DirectSound under Wine answers the same for each of these formats
+// (its table against the rule: direct_sound_win32_test.cpp).
 #include "sound/wave_format.h"
 #include "tests/support/audio_fixtures.h"
 
