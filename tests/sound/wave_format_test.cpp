@@ -14,12 +14,12 @@ TEST(WaveFormatRule, EachTermHoldsAtItsEdge)
     // Extensible: valid bits, the channel mask, then the PCM sub-format's GUID.
     const auto extensible = [](std::uint16_t bits, std::uint16_t validBits)
     {
-        const std::uint8_t low = std::uint8_t(validBits), high = std::uint8_t(validBits >> 8);
+        Bytes extra = {0, 0,    3, 0,    0, 0, 1,    0, 0,    0,    0,
+                       0, 0x10, 0, 0x80, 0, 0, 0xAA, 0, 0x38, 0x9B, 0x71};
+        extra[0] = std::uint8_t(validBits);
+        extra[1] = std::uint8_t(validBits >> 8);
         return testing_support::FormatChunkBody(
-            {.formatTag = 0xFFFE,
-             .bitsPerSample = bits,
-             .extra = {low, high, 3, 0,    0, 0, 1,    0, 0,    0,    0,
-                       0,   0x10, 0, 0x80, 0, 0, 0xAA, 0, 0x38, 0x9B, 0x71}});
+            {.formatTag = 0xFFFE, .bitsPerSample = bits, .extra = extra});
     };
     Bytes noChannels = testing_support::FormatChunkBody({.channels = 0});
     noChannels.resize(18);

@@ -69,12 +69,8 @@ TEST(TensionDraft, EveryLengthAndShapeGivesADraftTheCheckAcceptsThatFollowsTheMu
                 << log.CStr() << text;
             EXPECT_STREQ(log.CStr(), "") << label;
             const float finale = draft.GetFinaleTime();
-            if (name == "one peak")
-            {
-                EXPECT_EQ(loudness[std::size_t(finale)],
-                          *std::max_element(loudness.begin(), loudness.end()))
-                    << label;
-            }
+            const double loudest = *std::max_element(loudness.begin(), loudness.end());
+            EXPECT_TRUE(name != "one peak" || loudness[std::size_t(finale)] == loudest) << label;
             EXPECT_TRUE(draft.IsFinale(finale)) << label;
             EXPECT_EQ(draft.GetTension(finale + draft.GetFinaleWindow()),
                       tension::TensionLevel::Climax)
