@@ -25,6 +25,7 @@ inline constexpr int kKeyPageCount = 2;
 inline constexpr int kKeyConfigPageIndex = 5;
 inline constexpr int kGraphicsPageIndex = 0;
 inline constexpr int kGamePageIndex = 1;
+inline constexpr int kNetworkPageIndex = 2;
 inline constexpr int kReplayPageIndex = 3;
 inline constexpr int kUserMusicPageIndex = 4;
 inline constexpr int kRadioChatPageIndex = 6;

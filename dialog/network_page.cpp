@@ -18,7 +18,6 @@
 namespace
 {
 
-constexpr int kNetworkPageIndex = 2;
 constexpr char kErrorCaption[] = "Error";
 constexpr int kOctetFields[4] = {IDC_IP_OCTET1, IDC_IP_OCTET2, IDC_IP_OCTET3, IDC_IP_OCTET4};
 

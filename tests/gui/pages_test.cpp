@@ -50,7 +50,6 @@ struct Wiring
     Field (*field)(config::CSaveConfig&);
 };
 
-constexpr int kNetwork = 2;
 constexpr int kChatRow = IDC_RADIO_CHAT_ROW_STEP * (config::kRadioChatCount - 1);
 constexpr int kMusicRow = IDC_MUSIC_ROW_STEP * (config::kUserBgmRowCount - 1);
 
@@ -61,9 +60,9 @@ const Wiring kWirings[] = {
     {kGamePageIndex, IDC_CAPTURE_ENABLED, kCheck, FIELD(Game()->captureEnabled)},
     {kGamePageIndex, IDC_SE_VOLUME, kSlider, FIELD(Game()->seVolume)},
     {kGamePageIndex, IDC_LOCK_ON_TYPE, kChoice, FIELD(Game()->lockOnType)},
-    {kNetwork, IDC_NETWORK_PLAY_BGM, kCheck, FIELD(Network()->playBgm)},
-    {kNetwork, IDC_NETWORK_KEY_RESPONSE, kChoice, FIELD(Network()->keyResponse)},
-    {kNetwork, IDC_NETWORK_PORT, kEdit, FIELD(Network()->port)},
+    {kNetworkPageIndex, IDC_NETWORK_PLAY_BGM, kCheck, FIELD(Network()->playBgm)},
+    {kNetworkPageIndex, IDC_NETWORK_KEY_RESPONSE, kChoice, FIELD(Network()->keyResponse)},
+    {kNetworkPageIndex, IDC_NETWORK_PORT, kEdit, FIELD(Network()->port)},
     {kReplayPageIndex, IDC_SAVE_REPLAYS + 30, kCheck, FIELD(Replay()->replayLock[29])},
     {kRadioChatPageIndex, IDC_RADIO_CHAT_TEXT_FIRST + kChatRow, kEdit,
      FIELD(RadioChat()->entries[11].text)},
