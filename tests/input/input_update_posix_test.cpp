@@ -92,6 +92,7 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     joystick.lX = -999;
     joystick.lY = 999;
     joystick.lRy = 700;
+    joystick.lRx = -600; // as given: no option of slot 1 inverts it
     joystick.rgbButtons[0] = 0x80;
     joystick.rgdwPOV[0] = 4500;
     Devices().xinputConnected[1] = true;
@@ -109,8 +110,8 @@ TEST_F(InputUpdate, ControllersFeedTheirSlots)
     EXPECT_FLOAT_EQ(slot1.leftX, -0.99f);
     EXPECT_FLOAT_EQ(slot1.leftY, 0.99f);
     EXPECT_NEAR(slot1.leftAngle, 225.0f, 1e-3);
-    EXPECT_NEAR(slot1.rightAngle, 180.0f, 1e-3);
-    for (int code : {0, 3, 5, 6, 10, 14})
+    EXPECT_NEAR(slot1.rightAngle, 220.6f, 1e-2);
+    for (int code : {0, 3, 5, 6, 10, 11, 14})
         EXPECT_EQ(slot1.current[kFirstVirtualButton + code], 1u) << "code " << code;
     EXPECT_EQ(slot1.current[kFirstVirtualButton + 15], 0u) << "pad 1 is not read";
 

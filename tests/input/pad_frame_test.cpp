@@ -39,7 +39,7 @@ TEST(JoystickFrame, DirectionsCountBeyond500AndAxesRestBelow100)
         {{}, 0xFFFF, {}, {}, {}},
         {{}, 4500, {}, {kDpadUp, kDpadRight}, {}},
         {{}, 13500, {}, {kDpadDown, kDpadRight}, {}},
-        {{}, 18000, {}, {kDpadDown}, {}},
+        {{}, 22500, {}, {kDpadDown, kDpadLeft}, {}},
         {{}, 31500, {}, {kDpadUp, kDpadLeft}, {}},
         {{0, -501}, kCentred, {}, {kLeftStickUp}, {0, -501}},
         {{-500, 500}, kCentred, {}, {}, {-500, 500}},

@@ -119,7 +119,8 @@ TEST(TensionParse, EntriesKeysValuesAndComments)
          "fn:x;\nlt:10;\nHt:20;\nnT:30;\nCt:190;\ncf:195;\nFc:c;\nLOW TENSION:5;\nＬＯＷ:6;", true,
          kNotTension + kNotTension, "0N 10L 20H 30N 190C 200N"},
         {"comments where keys are read, one inside a key", 200,
-         "// note\nFN:x; // name\n/* LOW:50; */\nLO/* joined */W:30;\nHI // split\n:40;\nLOW:45;",
+         "// note\nFN:x; // name\n/* LOW:50; 2*3 a/b */\nLO/* joined */W:30;\nHI // "
+         "split\n:40;\nLOW:45;",
          true, "", "0N 30L 40H 45L 200N"},
         {"an unterminated block comment", 200, "FN:x;\n/* open", false, ""},
         {"level times outside the music or no number", 200,
