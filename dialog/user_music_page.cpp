@@ -138,8 +138,9 @@ bool WriteDraft(const std::string& musicPath, const std::string& path)
     sound::MusicMeasure music;
     if (!sound::MeasureMusic(musicPath.c_str(), &music))
         return false;
-    const std::string text =
-        tension::DraftTension(tension::DraftName(musicPath), music.length, music.loudness);
+    // The path is in the system's code page; the name entry is code page 932.
+    const std::string name = tension::DraftName(base::Cp932From(base::WideFromAnsi(musicPath)));
+    const std::string text = tension::DraftTension(name, music.length, music.loudness);
     return base::WriteNewFileAtomically(path.c_str(), text.data(), text.size());
 }
 

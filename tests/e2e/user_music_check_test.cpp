@@ -1,6 +1,7 @@
 // Music rows checked as a user checks them: VEKConfig.exe started on its
 // own, the paths typed in, チェック pressed and its boxes answered, then the
 // rows saved as typed.
+#include "base/window_text_win32.h"
 #include "config/fixed_text.h"
 #include "config/save_config.h"
 #include "resources/resource.h"
@@ -11,15 +12,14 @@
 #include <gtest/gtest.h>
 
 // A missing tension file: after the page's own box a draft from the music
-// is offered; Yes writes it where the field says, fills the field and checks
-// again. With the field empty and a file beside the music, nothing is
-// offered and that file stays.
+// is offered; Yes writes it where the field says (named in code page 932 on
+// any system), fills the field and checks again. With the field empty and a
+// file beside the music, nothing is offered and that file stays.
 TEST(UserMusicCheck, AMissingTensionFileIsDraftedFromTheMusicOnYesNeverOverAFile)
 {
     testing_support::TempSaveFolder folder;
-    const std::string music = folder.Root().File("rising.wav"),
-                      kept = folder.Root().File("kept.wav");
-    const std::string drafted = folder.Root().File("drafted.txt");
+    const std::string music = folder.Root().File("") + *base::AnsiFrom(L"rising\xD7") + ".wav";
+    const std::string kept = folder.Root().File("kept.wav"), drafted = folder.Root().File("n.txt");
     testing_support::WriteBytes(
         music, testing_support::MakeToneWave({1, 1, 8000, 16, {}, 0}, 90.0,
                                              [](double t) { return t < 60 ? -30.0 : -12.0; }));
@@ -42,7 +42,9 @@ TEST(UserMusicCheck, AMissingTensionFileIsDraftedFromTheMusicOnYesNeverOverAFile
     const e2e::MessageBoxSeen success = tool.AnswerMessageBox(IDOK);
     EXPECT_EQ(success.caption + success.text, "テンションファイル作成成功!!");
     EXPECT_EQ(success.owner, nullptr);
-    EXPECT_EQ(testing_support::ReadBytes(drafted)[0], '/') << "the draft's first comment";
+    const std::vector<std::uint8_t> draft = testing_support::ReadBytes(drafted);
+    EXPECT_NE(std::string(draft.begin(), draft.end()).find("\nFILENAME:rising\x81\x7E;"),
+              std::string::npos);
     EXPECT_EQ(e2e::WindowText(GetDlgItem(page, IDC_TENSION_PATH_FIRST)), drafted);
 
     e2e::PostCommand(page, IDC_MUSIC_CHECK_FIRST + IDC_MUSIC_ROW_STEP);
