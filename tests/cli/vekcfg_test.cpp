@@ -240,7 +240,6 @@ TEST_F(Commands, SetTakesANumberOrAMeaningAndApplyOfWhatShowPrintsCopiesAFile)
     const std::string out = Vekcfg({"show", settings}).out;
     for (const char8_t* line : {
              u8"graphics.screenSize = 3 (1280×960)\n",
-             u8"graphics.showMovie = 1 (on)\n", // its neighbour set, it is kept
              u8"keys.keyboardKeys[14] = 200 (スライド/決定: UP)\n",
              u8"keys.padConfigs[1].buttons[14] = 16 (スライド/決定: BUTTON3)\n",
              u8"network.connectList[0] = \"192.168.001.*\" (192.168.1.0)\n",
